@@ -1,0 +1,230 @@
+#include "cli/Commands.h"
+
+#include "cli/CliUserPort.h"
+#include "cli/DemoFiles.h"
+#include "cli/Statements.h"
+#include "control/CatalogControl.h"
+#include "platform/Browser.h"
+#include "platform/FileSystem.h"
+#include "platform/SettingsStore.h"
+
+#include <QCommandLineParser>
+#include <QDir>
+#include <QFileInfo>
+#include <QTextStream>
+
+#include <cstdio>
+
+namespace zorbin::cli {
+namespace {
+
+QTextStream &out()
+{
+    static QTextStream stream(stdout);
+    return stream;
+}
+
+QTextStream &err()
+{
+    static QTextStream stream(stderr);
+    return stream;
+}
+
+const QString SettingsOption = QStringLiteral("settings");
+const QString UseMarkedOption = QStringLiteral("use-marked");
+const QString OnlyWithPictureOption = QStringLiteral("only-with-picture");
+const QString OpenOption = QStringLiteral("open");
+const QString OutOption = QStringLiteral("out");
+
+void addSettingsOption(QCommandLineParser &parser)
+{
+    parser.addOption({SettingsOption,
+                      QStringLiteral("Read the settings from FILE, an INI file with a [Params] section holding the "
+                                     "keys of the settings store, instead of the user's settings."),
+                      QStringLiteral("FILE")});
+}
+
+void addRunOptions(QCommandLineParser &parser)
+{
+    addSettingsOption(parser);
+    parser.addOption({UseMarkedOption, QStringLiteral("Keep the last working database and the items marked by hand "
+                                                      "in it instead of collecting the items anew.")});
+    parser.addOption({OnlyWithPictureOption, QStringLiteral("Only items that have a picture.")});
+    parser.addOption({OpenOption, QStringLiteral("Open the result in a new browser window.")});
+}
+
+// Parses the subcommand's options; on --help or a bad option prints and returns an exit code.
+std::optional<int> parse(QCommandLineParser &parser, const QStringList &arguments)
+{
+    parser.addHelpOption();
+    if (!parser.parse(arguments)) {
+        err() << parser.errorText() << "\n\n" << parser.helpText();
+        return UsageError;
+    }
+    if (parser.isSet(QStringLiteral("help"))) {
+        out() << parser.helpText();
+        return Success;
+    }
+    if (!parser.positionalArguments().isEmpty()) {
+        err() << "Unexpected argument: " << parser.positionalArguments().constFirst() << "\n\n"
+              << parser.helpText();
+        return UsageError;
+    }
+    return std::nullopt;
+}
+
+std::unique_ptr<SettingsStore> openStore(const QCommandLineParser &parser)
+{
+    if (!parser.isSet(SettingsOption))
+        return openUserSettingsStore();
+    return openIniSettingsStore(parser.value(SettingsOption));
+}
+
+std::optional<int> checkSettingsFile(const QCommandLineParser &parser)
+{
+    if (parser.isSet(SettingsOption) && !QFileInfo(parser.value(SettingsOption)).isFile()) {
+        err() << "The settings file " << parser.value(SettingsOption) << " does not exist.\n";
+        return UsageError;
+    }
+    return std::nullopt;
+}
+
+int finish(const RunOutcome &outcome, const RunState &state)
+{
+    switch (outcome.ending) {
+    case RunOutcome::Ending::Shown:
+        out() << QDir::toNativeSeparators(outcome.file) << '\n';
+        out().flush();
+        // Steps that failed during the collection have told their fault; the output exists
+        // but does not hold everything the settings asked for.
+        return state.CollectFailed ? Failure : Success;
+    case RunOutcome::Ending::NoItems:
+        return EmptyCatalog;
+    case RunOutcome::Ending::Failed:
+        if (!outcome.file.isEmpty())
+            out() << QDir::toNativeSeparators(outcome.file) << '\n';
+        return Failure;
+    case RunOutcome::Ending::Declined:
+        break;
+    }
+    return Failure;
+}
+
+// The catalog or list run on the given store.
+int runOutput(bool catalog, SettingsStore &store, const QCommandLineParser &parser,
+              const std::function<void(CatalogSettings &)> &adjust = {})
+{
+    std::unique_ptr<Browser> browser = parser.isSet(OpenOption) ? makeSystemBrowser() : nullptr;
+    CliUserPort user(browser.get());
+    CatalogControl control(user, store, localFileSystem());
+    control.UserControl_Initialize();
+    CatalogSettings &settings = control.settings();
+    if (parser.isSet(UseMarkedOption)) {
+        settings.ChkSelectAccount = CheckValue::Checked;
+        control.runState().WorkDBFile = lastWorkDatabase();
+    }
+    if (parser.isSet(OnlyWithPictureOption))
+        settings.ChkOnlyWithPic = CheckValue::Checked;
+    if (adjust)
+        adjust(settings);
+    const RunOutcome outcome =
+        catalog ? control.produceCatalog() : control.produceList(!parser.isSet(UseMarkedOption));
+    return finish(outcome, control.runState());
+}
+
+int catalogOrList(bool catalog, const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(catalog ? QStringLiteral("Writes the catalog and prints the path of its first page.")
+                                             : QStringLiteral("Writes the item list page and prints its path."));
+    addRunOptions(parser);
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    auto store = openStore(parser);
+    return runOutput(catalog, *store, parser);
+}
+
+int demo(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        QStringLiteral("Writes the catalog of the bundled demo accounting database and prints its first page."));
+    parser.addOption({OutOption, QStringLiteral("The folder to write into (default: catalog-demo in the current folder)."),
+                      QStringLiteral("DIR"), QStringLiteral("catalog-demo")});
+    parser.addOption({OpenOption, QStringLiteral("Open the catalog in a new browser window.")});
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    const auto files = findDemoFiles();
+    if (!files) {
+        err() << files.status().description() << '\n';
+        return Failure;
+    }
+    const QString folder = QFileInfo(parser.value(OutOption)).absoluteFilePath();
+    if (!QDir().mkpath(folder)) {
+        err() << "Cannot create the folder " << QDir::toNativeSeparators(folder) << '\n';
+        return Failure;
+    }
+    auto store = openIniSettingsStore(files->settingsFile);
+    return runOutput(true, *store, parser,
+                     [&folder](CatalogSettings &settings) { settings.txtPagingPath = QDir::toNativeSeparators(folder); });
+}
+
+int sql(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(QStringLiteral(
+        "Prints every statement a catalog run would send, one per line as 'label: statement'."));
+    addSettingsOption(parser);
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    auto store = openStore(parser);
+    CliUserPort user(nullptr);
+    CatalogControl control(user, *store, localFileSystem());
+    control.UserControl_Initialize();
+    const auto statements = runStatements(control.context());
+    if (!statements) {
+        err() << statements.status().description() << '\n';
+        return Failure;
+    }
+    for (const auto &[label, statement] : statements.value())
+        out() << label << ": " << statement << '\n';
+    return Success;
+}
+
+} // namespace
+
+QString overview()
+{
+    return QStringLiteral(
+        "Usage: zorbin-cli <command> [options]\n"
+        "\n"
+        "Makes the HTML product catalog of the accounting database without a window.\n"
+        "\n"
+        "Commands:\n"
+        "  catalog   write the catalog and print the path of its first page\n"
+        "  list      write the plain item list and print its path\n"
+        "  demo      write the catalog of the bundled demo database\n"
+        "  sql       print every statement a run would send\n"
+        "\n"
+        "'zorbin-cli <command> --help' describes a command's options.\n");
+}
+
+int run(const QString &command, const QStringList &arguments)
+{
+    if (command == QLatin1String("catalog"))
+        return catalogOrList(true, arguments);
+    if (command == QLatin1String("list"))
+        return catalogOrList(false, arguments);
+    if (command == QLatin1String("demo"))
+        return demo(arguments);
+    if (command == QLatin1String("sql"))
+        return sql(arguments);
+    err() << "Unknown command: " << command << "\n\n" << overview();
+    return UsageError;
+}
+
+} // namespace zorbin::cli

@@ -1,0 +1,38 @@
+#include "cli/DemoFiles.h"
+
+#include "workdb/WorkDatabasePath.h"
+
+#include <QCoreApplication>
+#include <QDir>
+#include <QFileInfo>
+
+namespace zorbin::cli {
+
+namespace {
+const QString DemoSettingsName = QStringLiteral("demo-settings.ini");
+}
+
+Result<DemoFiles> findDemoFiles()
+{
+    QStringList candidates;
+    if (const QString fromEnvironment = qEnvironmentVariable("ZORBIN_DEMO_DIR"); !fromEnvironment.isEmpty())
+        candidates << fromEnvironment;
+    candidates << QStringLiteral(ZORBIN_DEMO_BUILD_DIR) << QStringLiteral(ZORBIN_DEMO_INSTALL_DIR)
+               << QCoreApplication::applicationDirPath() + QStringLiteral("/../share/zorbin/demo");
+    for (const QString &folder : candidates) {
+        const QString settings = QDir(folder).filePath(DemoSettingsName);
+        if (QFileInfo(settings).isFile())
+            return DemoFiles{QDir(folder).absolutePath(), settings};
+    }
+    return Status::fault(QStringLiteral("The demo database was not found (looked in: %1). Build the project "
+                                        "first, or set ZORBIN_DEMO_DIR to the folder that holds %2.")
+                             .arg(candidates.join(QStringLiteral(", ")), DemoSettingsName));
+}
+
+QString lastWorkDatabase()
+{
+    const QString path = workDatabasePath();
+    return QFileInfo(path).isFile() ? path : QString();
+}
+
+} // namespace zorbin::cli

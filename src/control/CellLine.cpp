@@ -1,0 +1,31 @@
+#include "control/CellLine.h"
+
+#include "common/Numbers.h"
+
+namespace zorbin {
+
+std::optional<int> fieldOfTag(const QString &tag)
+{
+    const auto number = toWholeNumber(tag, 0, CatalogFieldCount - 1);
+    if (!number)
+        return std::nullopt;
+    return static_cast<int>(*number);
+}
+
+std::optional<int> CellLine::field() const
+{
+    return fieldOfTag(tag);
+}
+
+QString CellLine::slotCaption() const
+{
+    const auto number = field();
+    return number ? catalogFields()[static_cast<std::size_t>(*number)].caption : QString();
+}
+
+LabelColours CellLine::slotColours() const
+{
+    return field() ? paletteColours() : emptySlotColours();
+}
+
+} // namespace zorbin

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <QString>
+
+// Where the program puts its files on this platform.
+namespace zorbin {
+
+// The folder separator of the platform: "\" on Windows, "/" elsewhere. Output folders and
+// picture references are written and split with it.
+QChar pathSeparator();
+
+// `folder` with one separator at its end (an empty text stays empty).
+QString withTrailingSeparator(const QString &folder);
+
+// The user's temporary folder: the "Temp" variable on Windows, TMPDIR elsewhere, and the
+// platform's own temporary folder when the variable is not set (never the file-system root).
+// No trailing separator.
+QString temporaryFolder();
+
+// The home-based stand-ins for the Windows defaults "c:\photos\" and "c:\output".
+QString defaultPictureFolder();
+QString defaultOutputFolder();
+
+} // namespace zorbin

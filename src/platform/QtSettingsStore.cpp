@@ -1,0 +1,101 @@
+#include "platform/SettingsStore.h"
+
+#include <QFile>
+#include <QSettings>
+#include <QStringList>
+
+#include <map>
+#include <memory>
+
+namespace zorbin {
+namespace {
+
+// QSettings keeps every value the program writes as a string; a hand-edited INI line with
+// commas reads back as a list, which is joined again so that no text is lost.
+QString asText(const QVariant &value)
+{
+    if (value.metaType().id() == QMetaType::QStringList)
+        return value.toStringList().join(QLatin1Char(','));
+    return value.toString();
+}
+
+class QtSettingsStore final : public SettingsStore
+{
+public:
+    // `fixedFile` empty: one native store per application name; otherwise that INI file for all.
+    explicit QtSettingsStore(QString fixedFile) : m_fixedFile(std::move(fixedFile)) {}
+
+    QString read(const QString &app, const QString &section, const QString &key,
+                 const QString &fallback) const override
+    {
+        const auto *settings = open(app);
+        const QString path = section + QLatin1Char('/') + key;
+        if (!settings->contains(path))
+            return fallback;
+        return asText(settings->value(path));
+    }
+
+    bool contains(const QString &app, const QString &section, const QString &key) const override
+    {
+        return open(app)->contains(section + QLatin1Char('/') + key);
+    }
+
+    void write(const QString &app, const QString &section, const QString &key, const QString &value) override
+    {
+        auto *settings = open(app);
+        settings->setValue(section + QLatin1Char('/') + key, value);
+        settings->sync();
+        restrictToOwner(settings->fileName());
+    }
+
+private:
+    QSettings *open(const QString &app) const
+    {
+        const QString name = m_fixedFile.isEmpty() ? app : QString();
+        auto &settings = m_opened[name];
+        if (!settings)
+            settings = create(app);
+        return settings.get();
+    }
+
+    std::unique_ptr<QSettings> create(const QString &app) const
+    {
+        if (!m_fixedFile.isEmpty())
+            return std::make_unique<QSettings>(m_fixedFile, QSettings::IniFormat);
+#ifdef Q_OS_WIN
+        // The registry area where the settings of earlier versions live, so that they carry over.
+        return std::make_unique<QSettings>(
+            QStringLiteral("HKEY_CURRENT_USER\\Software\\VB and VBA Program Settings\\") + app,
+            QSettings::NativeFormat);
+#else
+        return std::make_unique<QSettings>(QSettings::NativeFormat, QSettings::UserScope, app, app);
+#endif
+    }
+
+    static void restrictToOwner(const QString &fileName)
+    {
+#ifndef Q_OS_WIN
+        if (QFile::exists(fileName))
+            QFile::setPermissions(fileName, QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+#else
+        Q_UNUSED(fileName);
+#endif
+    }
+
+    QString m_fixedFile;
+    mutable std::map<QString, std::unique_ptr<QSettings>> m_opened;
+};
+
+} // namespace
+
+std::unique_ptr<SettingsStore> openUserSettingsStore()
+{
+    return std::make_unique<QtSettingsStore>(QString());
+}
+
+std::unique_ptr<SettingsStore> openIniSettingsStore(const QString &path)
+{
+    return std::make_unique<QtSettingsStore>(path);
+}
+
+} // namespace zorbin

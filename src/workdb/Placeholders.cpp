@@ -1,0 +1,11 @@
+// Stand-in until the collection is written.
+#include "workdb/CollectionRun.h"
+
+namespace zorbin {
+
+Status BuildAndCollectData(RunContext &)
+{
+    return Status::fault(QStringLiteral("איסוף הנתונים עדיין אינו זמין בגרסה זו."));
+}
+
+} // namespace zorbin

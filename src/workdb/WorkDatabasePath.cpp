@@ -1,0 +1,12 @@
+#include "workdb/WorkDatabasePath.h"
+
+#include "platform/Paths.h"
+
+namespace zorbin {
+
+QString workDatabasePath()
+{
+    return withTrailingSeparator(temporaryFolder()) + WorkDatabaseName;
+}
+
+} // namespace zorbin

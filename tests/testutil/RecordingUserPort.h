@@ -1,0 +1,72 @@
+#pragma once
+
+#include "control/UserPort.h"
+
+#include <QList>
+#include <QStringList>
+
+#include <functional>
+
+namespace zorbin::test {
+
+// A UserPort that records what the core said and asked, answers questions from a queue
+// (Yes when the queue is empty), and runs a hook at each yield, where a test can press stop.
+class RecordingUserPort final : public UserPort
+{
+public:
+    struct Message
+    {
+        QString text;
+        QString title;
+        MessageIcon icon;
+    };
+
+    Answer ask(const QString &text, const QString &title, QuestionButtons buttons) override
+    {
+        questions << text;
+        questionTitles << title;
+        questionButtons << buttons;
+        return answers.isEmpty() ? Answer::Yes : answers.takeFirst();
+    }
+    void tell(const QString &text, const QString &title, MessageIcon icon) override
+    {
+        messages << Message{text, title, icon};
+    }
+    void showStatus(const QString &text) override { statuses << text; }
+    int progressFrameWidth() const override { return frameWidth; }
+    int progressFillWidth() const override { return fillWidth; }
+    void setProgressFillWidth(int width) override
+    {
+        fillWidth = width;
+        widths << width;
+    }
+    void yield() override
+    {
+        ++yields;
+        if (onYield)
+            onYield();
+    }
+    Status openBrowser(const QString &file) override
+    {
+        browsed << file;
+        return browserResult;
+    }
+    void setBusy(bool busy) override { busyChanges << busy; }
+
+    QList<Answer> answers;
+    QStringList questions;
+    QStringList questionTitles;
+    QList<QuestionButtons> questionButtons;
+    QList<Message> messages;
+    QStringList statuses;
+    int frameWidth = 1000;
+    int fillWidth = 0;
+    QList<int> widths;
+    int yields = 0;
+    std::function<void()> onYield;
+    QStringList browsed;
+    Status browserResult;
+    QList<bool> busyChanges;
+};
+
+} // namespace zorbin::test
