@@ -48,13 +48,15 @@ public:
 
     Status makeFolder(const QString &path) override
     {
-        const QFileInfo info(path);
+        // "c:\\out\\" names the folder "out": its parent is the folder above it.
+        const QString folder = QDir::cleanPath(QDir::fromNativeSeparators(path));
+        const QFileInfo info(folder);
         if (info.isDir())
             return Status::ok();
         if (!QFileInfo(info.absolutePath()).isDir())
-            return Status::fault(QStringLiteral("לא ניתן ליצור את המחיצה %1: המחיצה שמעליה אינה קיימת.")
-                                     .arg(native(path)));
-        if (!QDir().mkdir(path))
+            return Status::fault(
+                QStringLiteral("לא ניתן ליצור את המחיצה %1: המחיצה שמעליה אינה קיימת.").arg(native(path)));
+        if (!QDir().mkdir(folder))
             return Status::fault(QStringLiteral("לא ניתן ליצור את המחיצה %1.").arg(native(path)));
         return Status::ok();
     }

@@ -26,9 +26,18 @@ public:
     }
 
     // Shortcuts for the store's one location, "Zorbin"/"Params".
-    void set(const QString &key, const QString &value) { values.insert(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key), value); }
-    QString get(const QString &key) const { return values.value(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key)); }
-    bool has(const QString &key) const { return values.contains(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key)); }
+    void set(const QString &key, const QString &value)
+    {
+        values.insert(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key), value);
+    }
+    QString get(const QString &key) const
+    {
+        return values.value(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key));
+    }
+    bool has(const QString &key) const
+    {
+        return values.contains(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key));
+    }
     // The keys under "Zorbin"/"Params", without the prefix.
     QStringList keys() const
     {
