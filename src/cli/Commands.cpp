@@ -12,7 +12,6 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QTextStream>
-
 #include <cstdio>
 
 namespace zorbin::cli {
@@ -38,17 +37,19 @@ const QString OutOption = QStringLiteral("out");
 
 void addSettingsOption(QCommandLineParser &parser)
 {
-    parser.addOption({SettingsOption,
-                      QStringLiteral("Read the settings from FILE, an INI file with a [Params] section holding the "
-                                     "keys of the settings store, instead of the user's settings."),
-                      QStringLiteral("FILE")});
+    parser.addOption(
+        {SettingsOption,
+         QStringLiteral("Read the settings from FILE, an INI file with a [Params] section holding the "
+                        "keys of the settings store, instead of the user's settings."),
+         QStringLiteral("FILE")});
 }
 
 void addRunOptions(QCommandLineParser &parser)
 {
     addSettingsOption(parser);
-    parser.addOption({UseMarkedOption, QStringLiteral("Keep the last working database and the items marked by hand "
-                                                      "in it instead of collecting the items anew.")});
+    parser.addOption(
+        {UseMarkedOption, QStringLiteral("Keep the last working database and the items marked by hand "
+                                         "in it instead of collecting the items anew.")});
     parser.addOption({OnlyWithPictureOption, QStringLiteral("Only items that have a picture.")});
     parser.addOption({OpenOption, QStringLiteral("Open the result in a new browser window.")});
 }
@@ -135,8 +136,9 @@ int runOutput(bool catalog, SettingsStore &store, const QCommandLineParser &pars
 int catalogOrList(bool catalog, const QStringList &arguments)
 {
     QCommandLineParser parser;
-    parser.setApplicationDescription(catalog ? QStringLiteral("Writes the catalog and prints the path of its first page.")
-                                             : QStringLiteral("Writes the item list page and prints its path."));
+    parser.setApplicationDescription(
+        catalog ? QStringLiteral("Writes the catalog and prints the path of its first page.")
+                : QStringLiteral("Writes the item list page and prints its path."));
     addRunOptions(parser);
     if (const auto exit = parse(parser, arguments))
         return *exit;
@@ -149,10 +151,11 @@ int catalogOrList(bool catalog, const QStringList &arguments)
 int demo(const QStringList &arguments)
 {
     QCommandLineParser parser;
-    parser.setApplicationDescription(
-        QStringLiteral("Writes the catalog of the bundled demo accounting database and prints its first page."));
-    parser.addOption({OutOption, QStringLiteral("The folder to write into (default: catalog-demo in the current folder)."),
-                      QStringLiteral("DIR"), QStringLiteral("catalog-demo")});
+    parser.setApplicationDescription(QStringLiteral(
+        "Writes the catalog of the bundled demo accounting database and prints its first page."));
+    parser.addOption(
+        {OutOption, QStringLiteral("The folder to write into (default: catalog-demo in the current folder)."),
+         QStringLiteral("DIR"), QStringLiteral("catalog-demo")});
     parser.addOption({OpenOption, QStringLiteral("Open the catalog in a new browser window.")});
     if (const auto exit = parse(parser, arguments))
         return *exit;
@@ -167,8 +170,9 @@ int demo(const QStringList &arguments)
         return Failure;
     }
     auto store = openIniSettingsStore(files->settingsFile);
-    return runOutput(true, *store, parser,
-                     [&folder](CatalogSettings &settings) { settings.txtPagingPath = QDir::toNativeSeparators(folder); });
+    return runOutput(true, *store, parser, [&folder](CatalogSettings &settings) {
+        settings.txtPagingPath = QDir::toNativeSeparators(folder);
+    });
 }
 
 int sql(const QStringList &arguments)
@@ -199,18 +203,17 @@ int sql(const QStringList &arguments)
 
 QString overview()
 {
-    return QStringLiteral(
-        "Usage: zorbin-cli <command> [options]\n"
-        "\n"
-        "Makes the HTML product catalog of the accounting database without a window.\n"
-        "\n"
-        "Commands:\n"
-        "  catalog   write the catalog and print the path of its first page\n"
-        "  list      write the plain item list and print its path\n"
-        "  demo      write the catalog of the bundled demo database\n"
-        "  sql       print every statement a run would send\n"
-        "\n"
-        "'zorbin-cli <command> --help' describes a command's options.\n");
+    return QStringLiteral("Usage: zorbin-cli <command> [options]\n"
+                          "\n"
+                          "Makes the HTML product catalog of the accounting database without a window.\n"
+                          "\n"
+                          "Commands:\n"
+                          "  catalog   write the catalog and print the path of its first page\n"
+                          "  list      write the plain item list and print its path\n"
+                          "  demo      write the catalog of the bundled demo database\n"
+                          "  sql       print every statement a run would send\n"
+                          "\n"
+                          "'zorbin-cli <command> --help' describes a command's options.\n");
 }
 
 int run(const QString &command, const QStringList &arguments)

@@ -10,7 +10,7 @@ namespace zorbin::cli {
 struct DemoFiles
 {
     QString folder;
-    QString settingsFile;  // an INI settings file whose connection points at the demo database
+    QString settingsFile; // an INI settings file whose connection points at the demo database
 };
 
 // Looks for the demo in ZORBIN_DEMO_DIR, the build tree, then the installed data folder.

@@ -3,7 +3,6 @@
 #include "common/Status.h"
 
 #include <QString>
-
 #include <utility>
 #include <vector>
 

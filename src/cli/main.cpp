@@ -3,7 +3,6 @@
 
 #include <QCoreApplication>
 #include <QTextStream>
-
 #include <cstdio>
 
 int main(int argc, char *argv[])
@@ -23,6 +22,6 @@ int main(int argc, char *argv[])
         QTextStream(stdout) << "zorbin-cli " << QCoreApplication::applicationVersion() << '\n';
         return 0;
     }
-    arguments.removeAt(1);  // the subcommand's own parser sees "zorbin-cli <options>"
+    arguments.removeAt(1); // the subcommand's own parser sees "zorbin-cli <options>"
     return zorbin::cli::run(command, arguments);
 }

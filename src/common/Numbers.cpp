@@ -1,7 +1,6 @@
 #include "common/Numbers.h"
 
 #include <QRegularExpression>
-
 #include <cmath>
 #include <limits>
 
@@ -9,7 +8,7 @@ namespace zorbin {
 
 std::int64_t roundHalfEven(double value)
 {
-    return static_cast<std::int64_t>(std::nearbyint(value));  // the default rounding mode is half to even
+    return static_cast<std::int64_t>(std::nearbyint(value)); // the default rounding mode is half to even
 }
 
 std::optional<double> parseNumber(const QString &text)
@@ -41,8 +40,8 @@ std::optional<std::int64_t> toWholeNumber(const QString &text, std::int64_t lowe
 
 std::optional<std::int16_t> toInt16(const QString &text)
 {
-    const auto whole =
-        toWholeNumber(text, std::numeric_limits<std::int16_t>::min(), std::numeric_limits<std::int16_t>::max());
+    const auto whole = toWholeNumber(text, std::numeric_limits<std::int16_t>::min(),
+                                     std::numeric_limits<std::int16_t>::max());
     if (!whole)
         return std::nullopt;
     return static_cast<std::int16_t>(*whole);

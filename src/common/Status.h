@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QString>
-
 #include <optional>
 #include <utility>
 
@@ -13,7 +12,7 @@ namespace zorbin {
 class [[nodiscard]] Status
 {
 public:
-    Status() = default;  // success
+    Status() = default; // success
 
     static Status ok() { return {}; }
     static Status fault(QString description) { return Status(std::move(description)); }
@@ -30,8 +29,7 @@ private:
 };
 
 // A value, or the Status that explains why there is none.
-template <typename T>
-class [[nodiscard]] Result
+template <typename T> class [[nodiscard]] Result
 {
 public:
     Result(T value) : m_value(std::move(value)) {}

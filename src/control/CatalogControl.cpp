@@ -12,8 +12,8 @@ const QString CatalogQuestion = QStringLiteral("להתחיל בהכנת הקטל
 const QString CatalogQuestionTitle = QStringLiteral("שאלה חשובה");
 const QString RescanQuestion = QStringLiteral("לסרוק מחדש את הפריטים?");
 const QString RescanQuestionTitle = QStringLiteral("שים לב");
-const QString NoItemsText =
-    QStringLiteral("אין בקטלוג פריטים: אף פריט אינו עונה על ההגדרות שנבחרו. יש לבדוק את טווח הפריטים ואת הפריטים המסומנים.");
+const QString NoItemsText = QStringLiteral(
+    "אין בקטלוג פריטים: אף פריט אינו עונה על ההגדרות שנבחרו. יש לבדוק את טווח הפריטים ואת הפריטים המסומנים.");
 const QString NoItemsTitle = QStringLiteral("הקטלוג ריק");
 const QString NoWorkDatabaseText = QStringLiteral(
     "עדיין לא נאספו פריטים: יש ללחוץ על \"בחירת פריטים...\" או לבטל את הסימון של בחירת הפריטים, ואז לנסות שוב.");
@@ -42,8 +42,9 @@ private:
 };
 
 CatalogControl::CatalogControl(UserPort &user, SettingsStore &store, FileSystem &files, StagesFactory stages)
-    : m_user(user), m_store(store), m_files(files),
-      m_context{m_settings, m_connection, m_state, m_user, m_files}, m_persistence(store, m_settings)
+    : m_user(user), m_store(store),
+      m_files(files), m_context{m_settings, m_connection, m_state, m_user, m_files},
+      m_persistence(store, m_settings)
 {
     m_stages = stages ? stages(m_context, m_store) : makeStandardStages(m_context, m_store);
 }

@@ -21,10 +21,10 @@ class UserPort;
 struct RunOutcome
 {
     enum class Ending {
-        Declined,  // the user did not confirm, or another run was in progress
-        Shown,     // the output was written and opened (or, without a browser, written)
-        NoItems,   // the catalog query had no rows: nothing to show
-        Failed,    // a fault ended the run; the user has been told
+        Declined, // the user did not confirm, or another run was in progress
+        Shown,    // the output was written and opened (or, without a browser, written)
+        NoItems,  // the catalog query had no rows: nothing to show
+        Failed,   // a fault ended the run; the user has been told
     };
     Ending ending = Ending::Declined;
     QString file;        // the page that was (or would have been) shown

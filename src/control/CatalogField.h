@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QString>
-
 #include <array>
 #include <cstdint>
 #include <optional>
@@ -29,9 +28,9 @@ struct LabelColours
 // One of the nine data fields a cell line can show (the palette `LblTitle` of the page tab).
 struct CatalogField
 {
-    int number;       // 0 to 8, the line tag that selects it
-    QString column;   // the column of the catalog query that carries it, e.g. "ItemPic"
-    QString caption;  // what the palette and an assigned slot show, e.g. "תמונה"
+    int number;      // 0 to 8, the line tag that selects it
+    QString column;  // the column of the catalog query that carries it, e.g. "ItemPic"
+    QString caption; // what the palette and an assigned slot show, e.g. "תמונה"
 };
 
 inline constexpr int CatalogFieldCount = 9;

@@ -8,14 +8,11 @@ CatalogSettings::CatalogSettings()
     : CmbSortBy({QStringLiteral("מפתח פריט"), QStringLiteral("שם פריט"), QStringLiteral("קוד מיון")}),
       CmbSortDir({QStringLiteral("עולה"), QStringLiteral("יורד")}),
       CmbItemNameType({QStringLiteral("שם סטנדרטי"), QStringLiteral("שם לועזי")}),
-      txtPicPath(defaultPictureFolder()),
-      txtPicExtension(QStringLiteral(".JPG")),
-      txtRows(QStringLiteral("8")),
-      txtCols(QStringLiteral("3")),
+      txtPicPath(defaultPictureFolder()), txtPicExtension(QStringLiteral(".JPG")),
+      txtRows(QStringLiteral("8")), txtCols(QStringLiteral("3")),
       cmbPicLocation({QStringLiteral("בהתאם לטבלה"), QStringLiteral("מימין לנתונים")}),
       cmbPageSplit({QStringLiteral("קובץ אחד"), QStringLiteral("קובץ לעמוד")}),
-      txtTopPercent(QStringLiteral("10")),
-      txtBottomPercent(QStringLiteral("10"))
+      txtTopPercent(QStringLiteral("10")), txtBottomPercent(QStringLiteral("10"))
 {
     ItemCutOff.fill(QStringLiteral("*"));
 }

@@ -4,7 +4,6 @@
 #include "control/ChoiceList.h"
 
 #include <QString>
-
 #include <array>
 
 namespace zorbin {
@@ -18,8 +17,7 @@ inline bool isTicked(CheckValue value)
 }
 
 // A group of option buttons of which at most one is set; setting one clears the others.
-template <int N>
-class OptionGroup
+template <int N> class OptionGroup
 {
 public:
     bool value(int index) const { return m_values.at(static_cast<std::size_t>(index)); }
@@ -72,54 +70,54 @@ struct CatalogSettings
     CatalogSettings &operator=(const CatalogSettings &) = delete;
 
     // Item range tab ("טווח הפריטים").
-    CheckValue ChkCatCode = CheckValue::Unchecked;  // restrict to a range of sort codes
+    CheckValue ChkCatCode = CheckValue::Unchecked; // restrict to a range of sort codes
     QString txtFromSort;
     QString txtToSort;
-    CheckValue chkFilter = CheckValue::Unchecked;  // apply the cut-off pattern
-    std::array<QString, CutOffPositions> ItemCutOff;  // ItemCutOff[p - 1] is position p; "*" at first
-    CheckValue ChkItemKey = CheckValue::Unchecked;  // restrict to a range of item keys
+    CheckValue chkFilter = CheckValue::Unchecked;    // apply the cut-off pattern
+    std::array<QString, CutOffPositions> ItemCutOff; // ItemCutOff[p - 1] is position p; "*" at first
+    CheckValue ChkItemKey = CheckValue::Unchecked;   // restrict to a range of item keys
     QString txtFromItem;
     QString txtToItem;
-    ChoiceList CmbSortBy;   // 0 item key, 1 item name, 2 sort code
-    ChoiceList CmbSortDir;  // 0 ascending, 1 descending
-    CheckValue ChkSelectAccount = CheckValue::Unchecked;  // use the items marked by hand; not stored
+    ChoiceList CmbSortBy;                                // 0 item key, 1 item name, 2 sort code
+    ChoiceList CmbSortDir;                               // 0 ascending, 1 descending
+    CheckValue ChkSelectAccount = CheckValue::Unchecked; // use the items marked by hand; not stored
 
     // Data tab ("הגדרות נתונים").
-    ChoiceList CmbItemNameType;  // 0 standard name, 1 foreign name
+    ChoiceList CmbItemNameType; // 0 standard name, 1 foreign name
     CheckValue chkUsePriceField = CheckValue::Unchecked;
     CheckValue ChkUsePriceField2 = CheckValue::Unchecked;
-    ChoiceList cmbPriceField;   // filled from the accounting database; entry 0 the item's own price
+    ChoiceList cmbPriceField; // filled from the accounting database; entry 0 the item's own price
     ChoiceList cmbPriceField2;
     CheckValue ChkUseExtraNote1 = CheckValue::Unchecked;
     CheckValue ChkUseExtraNote2 = CheckValue::Unchecked;
-    ChoiceList cmbExtraNote1;  // filled from the accounting database
+    ChoiceList cmbExtraNote1; // filled from the accounting database
     ChoiceList cmbExtraNote2;
-    OptionGroup<3> OptPicSource;  // see PictureSource
-    ChoiceList cmbPicExtraNote;   // filled from the accounting database
-    QString txtPicPath;           // folder of pictures named by item key
+    OptionGroup<3> OptPicSource; // see PictureSource
+    ChoiceList cmbPicExtraNote;  // filled from the accounting database
+    QString txtPicPath;          // folder of pictures named by item key
     QString txtPicExtension;
 
     // Page tab ("הגדרת עמוד בקטלוג").
-    CellLines lines;  // caption = txtLineCaption(i), tag = lblLine(i), format = the format table
+    CellLines lines; // caption = txtLineCaption(i), tag = lblLine(i), format = the format table
     QString txtRows;
     QString txtCols;
-    ChoiceList cmbPicLocation;  // 0 according to the table, 1 to the right of the data
-    ChoiceList cmbPageSplit;    // 0 one file, 1 a file per page
-    CheckValue chkRules = CheckValue::Unchecked;  // a frame around every item
-    QString txtImageH;  // largest picture height in pixels; empty for no size attributes
+    ChoiceList cmbPicLocation;                   // 0 according to the table, 1 to the right of the data
+    ChoiceList cmbPageSplit;                     // 0 one file, 1 a file per page
+    CheckValue chkRules = CheckValue::Unchecked; // a frame around every item
+    QString txtImageH; // largest picture height in pixels; empty for no size attributes
     QString txtImageW;
-    CheckValue ChkOnlyWithPic = CheckValue::Unchecked;  // only items that have a picture; not stored
+    CheckValue ChkOnlyWithPic = CheckValue::Unchecked; // only items that have a picture; not stored
 
     // Titles tab ("כותרות לעמוד").
     QString txtTopTitle;
     QString txtTopTitle2;
     QString txtBottomTitle;
-    QString txtLogo;  // path of the logo picture; empty for none
+    QString txtLogo; // path of the logo picture; empty for none
     QString txtTopPercent;
     QString txtBottomPercent;
 
     // General tab ("כללי").
-    QString txtPagingPath;  // output folder; empty means the temporary folder
+    QString txtPagingPath; // output folder; empty means the temporary folder
 
     // The lists filled from the accounting database, in the order the start-up fills them.
     std::array<ChoiceList *, 5> sourceLists();

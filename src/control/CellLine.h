@@ -3,7 +3,6 @@
 #include "control/CatalogField.h"
 
 #include <QString>
-
 #include <array>
 #include <cstdint>
 #include <optional>

@@ -3,7 +3,6 @@
 #include <QAbstractListModel>
 #include <QString>
 #include <QVector>
-
 #include <cstdint>
 #include <optional>
 

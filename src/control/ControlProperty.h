@@ -3,7 +3,6 @@
 #include "control/CatalogSettings.h"
 
 #include <QString>
-
 #include <cstdint>
 #include <functional>
 
@@ -11,11 +10,11 @@ namespace zorbin {
 
 // Which property of a widget a stored value belongs to, with the store's code for it.
 enum class PropertyKind : int {
-    Text = 1,       // a text box's text
-    ListIndex = 2,  // a drop-down list's selected index, -1 for none
-    Value = 3,      // a check box's value (0, 1, 2) or an option button's state
-    Caption = 4,    // a label's caption
-    Tag = 41,       // a label's tag
+    Text = 1,      // a text box's text
+    ListIndex = 2, // a drop-down list's selected index, -1 for none
+    Value = 3,     // a check box's value (0, 1, 2) or an option button's state
+    Caption = 4,   // a label's caption
+    Tag = 41,      // a label's tag
 };
 
 // One persisted property of one widget of the settings record: how it reads as store text and
@@ -29,18 +28,18 @@ public:
     static ControlProperty check(CheckValue &value);
     static ControlProperty option(OptionGroup<3> &group, int index);
     static ControlProperty caption(QString &value);
-    static ControlProperty tag(QString &value);  // a cell line's field tag: empty or 0 to 8
-    static ControlProperty byte(std::uint8_t &value);  // one byte of the cell-line format table
+    static ControlProperty tag(QString &value);       // a cell line's field tag: empty or 0 to 8
+    static ControlProperty byte(std::uint8_t &value); // one byte of the cell-line format table
 
     PropertyKind kind() const { return m_kind; }
     QString storeText() const { return m_read(); }
     bool apply(const QString &storedText) const { return m_apply(storedText); }
 
 private:
-    ControlProperty(PropertyKind kind, std::function<QString()> read, std::function<bool(const QString &)> apply)
+    ControlProperty(PropertyKind kind, std::function<QString()> read,
+                    std::function<bool(const QString &)> apply)
         : m_kind(kind), m_read(std::move(read)), m_apply(std::move(apply))
-    {
-    }
+    {}
 
     PropertyKind m_kind;
     std::function<QString()> m_read;

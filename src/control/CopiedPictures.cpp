@@ -39,8 +39,7 @@ Status CopiedPictures::removeAll(FileSystem &files, const QString &imagesFolder)
 
 CopiedPictures::CopiedPictures(FileSystem &files, QString imagesFolder)
     : m_files(files), m_imagesFolder(std::move(imagesFolder))
-{
-}
+{}
 
 Status CopiedPictures::add(const QString &fileName)
 {

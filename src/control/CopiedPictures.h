@@ -5,7 +5,6 @@
 #include <QIODevice>
 #include <QString>
 #include <QStringList>
-
 #include <memory>
 
 namespace zorbin {

@@ -5,7 +5,6 @@
 
 #include <QHash>
 #include <QString>
-
 #include <cstdint>
 #include <vector>
 
@@ -39,8 +38,9 @@ std::vector<StoredSetting> cellFormatTable(CellLines &lines);
 // Saves or loads one value: Save writes the property's text under the key; Load reads the key
 // (the fallback when absent) and applies it. Returns false when the loaded text could not be
 // applied; the property then keeps its value.
-bool SetGetRegControlValue(std::uint8_t action, SettingsStore &store, const QString &app, const QString &section,
-                           const QString &key, const ControlProperty &property, const QString &fallback);
+bool SetGetRegControlValue(std::uint8_t action, SettingsStore &store, const QString &app,
+                           const QString &section, const QString &key, const ControlProperty &property,
+                           const QString &fallback);
 
 // Loads the settings record from the store and saves it back.
 //
@@ -67,7 +67,8 @@ public:
     QStringList unappliedKeys() const;
 
 private:
-    void persist(std::uint8_t action, const QString &app, const QString &section, const StoredSetting &setting);
+    void persist(std::uint8_t action, const QString &app, const QString &section,
+                 const StoredSetting &setting);
 
     SettingsStore &m_store;
     CatalogSettings &m_settings;

@@ -5,7 +5,6 @@
 #include <QIODevice>
 #include <QString>
 #include <QStringList>
-
 #include <memory>
 #include <optional>
 
@@ -19,7 +18,7 @@ class FileSystem
 public:
     virtual ~FileSystem() = default;
 
-    virtual bool fileExists(const QString &path) const = 0;    // a regular file
+    virtual bool fileExists(const QString &path) const = 0; // a regular file
     virtual bool folderExists(const QString &path) const = 0;
     // The file a picture reference names, taken literally (no wildcards), as the file system
     // spells it. Where names are case-sensitive a name that differs only in letter case is

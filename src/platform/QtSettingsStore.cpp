@@ -3,7 +3,6 @@
 #include <QFile>
 #include <QSettings>
 #include <QStringList>
-
 #include <map>
 #include <memory>
 

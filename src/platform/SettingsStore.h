@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QString>
-
 #include <memory>
 
 namespace zorbin {
@@ -17,7 +16,8 @@ public:
     virtual QString read(const QString &app, const QString &section, const QString &key,
                          const QString &fallback) const = 0;
     virtual bool contains(const QString &app, const QString &section, const QString &key) const = 0;
-    virtual void write(const QString &app, const QString &section, const QString &key, const QString &value) = 0;
+    virtual void write(const QString &app, const QString &section, const QString &key,
+                       const QString &value) = 0;
 };
 
 // The user's own store: on Windows the per-user registry area that earlier versions used,

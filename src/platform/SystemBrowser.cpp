@@ -41,7 +41,7 @@ public:
         } else if (program = findChromiumFamily(); !program.isEmpty()) {
             arguments << QStringLiteral("--new-window") << QStringLiteral("--app=") + url;
 #ifdef Q_OS_UNIX
-            if (::geteuid() == 0)  // Chromium refuses to start as root with its sandbox on.
+            if (::geteuid() == 0) // Chromium refuses to start as root with its sandbox on.
                 arguments << QStringLiteral("--no-sandbox");
 #endif
         } else {
@@ -57,9 +57,8 @@ public:
 #endif
         }
         if (program.isEmpty() || !QProcess::startDetached(program, arguments))
-            return Status::fault(
-                QStringLiteral("לא נמצא דפדפן להצגת %1. יש לפתוח את הקובץ בדפדפן.")
-                    .arg(QDir::toNativeSeparators(file)));
+            return Status::fault(QStringLiteral("לא נמצא דפדפן להצגת %1. יש לפתוח את הקובץ בדפדפן.")
+                                     .arg(QDir::toNativeSeparators(file)));
         return Status::ok();
     }
 };
