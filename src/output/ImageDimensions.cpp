@@ -6,7 +6,6 @@
 #include "platform/FileSystem.h"
 
 #include <QIODevice>
-
 #include <algorithm>
 #include <array>
 

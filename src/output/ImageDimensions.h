@@ -3,7 +3,6 @@
 #include <QHash>
 #include <QSize>
 #include <QString>
-
 #include <cstdint>
 #include <optional>
 
@@ -40,7 +39,7 @@ inline constexpr std::int64_t JpegSearchLimit = 64 * 1024;
 ImageInfo GetImageInfo(QIODevice &device);
 // The same for a file; a file that is missing or cannot be opened gives Kind Unknown.
 ImageInfo GetImageInfo(const FileSystem &files, const QString &path);
-ImageInfo GetImageInfo(const QString &path);  // on the local file system
+ImageInfo GetImageInfo(const QString &path); // on the local file system
 
 // The size at which a picture is shown so that it fits a box of at most maxWidth by maxHeight
 // pixels without distortion. A picture within the box keeps its size; a larger one is scaled
@@ -53,7 +52,7 @@ std::optional<QSize> fittedImageSize(const ImageInfo &info, int maxWidth, int ma
 // into the box, or the empty text when the file does not exist (looked up literally), is not a
 // recognised picture, or the box is not above 0 on both sides.
 QString ImageSizeAttr(const FileSystem &files, const QString &path, int maxWidth, int maxHeight);
-QString ImageSizeAttr(const QString &path, int maxWidth, int maxHeight);  // on the local file system
+QString ImageSizeAttr(const QString &path, int maxWidth, int maxHeight); // on the local file system
 
 // ImageSizeAttr for one run of a page writer: each picture file's header is read at most once,
 // however many items show it. The file system must outlive the object. Files are assumed not

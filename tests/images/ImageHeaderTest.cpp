@@ -1,6 +1,5 @@
-#include "output/ImageDimensions.h"
-
 #include "TestPictures.h"
+#include "output/ImageDimensions.h"
 #include "testutil/TestMain.h"
 
 #include <QBuffer>
@@ -53,7 +52,11 @@ QByteArray jpegWithFrame(uchar frameMarker, const QList<QPair<uchar, int>> &befo
     // Frame header: length 17, precision 8, height 300, width 200, then components.
     data += '\xFF';
     data += static_cast<char>(frameMarker);
-    data += QByteArray::fromHex("0011" "08" "012C" "00C8" "03");
+    data += QByteArray::fromHex("0011"
+                                "08"
+                                "012C"
+                                "00C8"
+                                "03");
     data += QByteArray(9, '\x01');
     data += QByteArray::fromHex("FFD9");
     return data;
@@ -172,10 +175,18 @@ private Q_SLOTS:
         QTest::newRow("JPEG start only") << QByteArray("\xFF\xD8\xFF", 3);
         QTest::newRow("JPEG frame header cut short") << jpegWithFrame(0xC0).left(8);
         QTest::newRow("JPEG segment beyond the end") << jpegWithFrame(0xC0, {{0xE1, 200}}).left(40);
-        QTest::newRow("BMP with the lowest height") << QByteArray::fromHex(
-            "424D" "00000000" "00000000" "36000000" "28000000" "01000000" "00000080");
-        QTest::newRow("PNG wider than 2^31-1") << QByteArray::fromHex(
-            "89504E470D0A1A0A" "0000000D49484452" "80000000" "00000001" "0802000000");
+        QTest::newRow("BMP with the lowest height") << QByteArray::fromHex("424D"
+                                                                           "00000000"
+                                                                           "00000000"
+                                                                           "36000000"
+                                                                           "28000000"
+                                                                           "01000000"
+                                                                           "00000080");
+        QTest::newRow("PNG wider than 2^31-1") << QByteArray::fromHex("89504E470D0A1A0A"
+                                                                      "0000000D49484452"
+                                                                      "80000000"
+                                                                      "00000001"
+                                                                      "0802000000");
         const QStringList pictures{QStringLiteral("png-type2.png"), QStringLiteral("picture.gif"),
                                    QStringLiteral("bottom-up.bmp"), QStringLiteral("baseline-exif.jpg")};
         for (const QString &picture : pictures) {
@@ -184,7 +195,7 @@ private Q_SLOTS:
             const qsizetype cut = picture.endsWith(QLatin1String(".png"))   ? 25
                                   : picture.endsWith(QLatin1String(".gif")) ? 9
                                   : picture.endsWith(QLatin1String(".bmp")) ? 25
-                                                                              : bytes.indexOf("\xFF\xC0") + 8;
+                                                                            : bytes.indexOf("\xFF\xC0") + 8;
             QTest::newRow(qPrintable(picture + QStringLiteral(" cut short"))) << bytes.left(cut);
         }
     }

@@ -45,8 +45,7 @@ std::optional<std::uint8_t> HeaderBytes::byteAt(std::int64_t position)
 namespace {
 
 // The unsigned number of type T stored at `bytes` in either byte order.
-template <typename T>
-std::optional<T> number(const std::uint8_t *bytes, bool bigEndian)
+template <typename T> std::optional<T> number(const std::uint8_t *bytes, bool bigEndian)
 {
     if (!bytes)
         return std::nullopt;

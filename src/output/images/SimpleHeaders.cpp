@@ -65,7 +65,8 @@ ImageInfo ReadBMPInfo(HeaderBytes &bytes)
     // A top-down picture stores its height negative; the lowest value has no positive partner.
     if (signedHeight == std::numeric_limits<std::int32_t>::min())
         return {};
-    return sized(ImageInfo::BMP, *width, static_cast<std::uint32_t>(signedHeight < 0 ? -signedHeight : signedHeight));
+    return sized(ImageInfo::BMP, *width,
+                 static_cast<std::uint32_t>(signedHeight < 0 ? -signedHeight : signedHeight));
 }
 
 } // namespace zorbin::images
