@@ -2,7 +2,6 @@
 #include "output/CatalogPages.h"
 #include "output/ImageCollection.h"
 #include "output/ListPage.h"
-#include "output/Stylesheet.h"
 
 namespace zorbin {
 namespace {
@@ -12,9 +11,17 @@ Status missing()
 }
 } // namespace
 
-Status CollectCatImages(RunContext &, const QString &, const QString &) { return missing(); }
-Result<QString> CreateCatHTML(RunContext &, const QString &, const QString &, const QString &) { return missing(); }
-Status CreateCSS(RunContext &, const QString &, bool) { return missing(); }
-Status CreateListHTML(RunContext &, const QString &, const QString &) { return missing(); }
+Status CollectCatImages(RunContext &, const QString &, const QString &)
+{
+    return missing();
+}
+Result<QString> CreateCatHTML(RunContext &, const QString &, const QString &, const QString &)
+{
+    return missing();
+}
+Status CreateListHTML(RunContext &, const QString &, const QString &)
+{
+    return missing();
+}
 
 } // namespace zorbin

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "common/Status.h"
+#include "platform/Windows1255Encoder.h"
+
+#include <QIODevice>
+#include <QString>
+#include <memory>
+
+namespace zorbin {
+
+class FileSystem;
+
+// A text file of the catalog, written line by line in windows-1255, every line ended by
+// carriage return and line feed (see Windows1255Encoder for characters the code page lacks).
+//
+// Writes are buffered. The first failure to write is kept and every later write is dropped;
+// close() reports it. A writer destroyed without close() writes what it holds and closes the
+// file, ignoring failures.
+class Windows1255Writer
+{
+public:
+    // Deletes a file of that name and creates it anew through `files`.
+    static Result<std::unique_ptr<Windows1255Writer>> create(FileSystem &files, const QString &path);
+
+    ~Windows1255Writer();
+    Windows1255Writer(const Windows1255Writer &) = delete;
+    Windows1255Writer &operator=(const Windows1255Writer &) = delete;
+
+    // Text without a line end.
+    void write(QStringView text);
+    // Text and a line end.
+    void writeLine(QStringView text);
+    // A line end.
+    void endLine();
+
+    // Whether every write so far reached the file.
+    bool isOk() const { return m_status.isOk(); }
+    // Writes what is held and closes the file: the first failure, if any.
+    Status close();
+
+    const QString &path() const { return m_path; }
+    // Bytes handed to the file so far.
+    qint64 bytesWritten() const { return m_bytesWritten; }
+
+private:
+    Windows1255Writer(std::unique_ptr<QIODevice> device, QString path);
+    void flushPending(bool last);
+
+    std::unique_ptr<QIODevice> m_device;
+    QString m_path;
+    Windows1255Encoder m_encoder;
+    QString m_pending;
+    QByteArray m_bytes;
+    Status m_status;
+    qint64 m_bytesWritten = 0;
+};
+
+} // namespace zorbin
