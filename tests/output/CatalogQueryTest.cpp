@@ -1,8 +1,8 @@
 // The catalog statement: which columns each cell line adds, the order, the filters.
 #include "output/CatalogQuery.h"
 
-#include "TestRegistry.h"
 #include "control/CatalogSettings.h"
+#include "testutil/TestMain.h"
 
 #include <QTest>
 
@@ -180,5 +180,5 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_REGISTER_TEST(CatalogQueryTest)
+ZORBIN_TEST_CLASS(CatalogQueryTest)
 #include "CatalogQueryTest.moc"

@@ -1,10 +1,10 @@
 // The code page of the catalog files and the number and date formats.
-#include "TestRegistry.h"
 #include "platform/ValueFormat.h"
 #include "platform/Windows1255Encoder.h"
 #include "platform/Windows1255Writer.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/TestFiles.h"
+#include "testutil/TestMain.h"
 
 #include <QLocale>
 #include <QTemporaryDir>
@@ -229,5 +229,5 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_REGISTER_TEST(EncodingTest)
+ZORBIN_TEST_CLASS(EncodingTest)
 #include "EncodingTest.moc"

@@ -1,8 +1,8 @@
 // Page and picture names, and the conversions of stored values into page text.
 #include "output/FileNaming.h"
 
-#include "TestRegistry.h"
 #include "platform/Paths.h"
+#include "testutil/TestMain.h"
 
 #include <QTest>
 
@@ -159,5 +159,5 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_REGISTER_TEST(FileNamingTest)
+ZORBIN_TEST_CLASS(FileNamingTest)
 #include "FileNamingTest.moc"

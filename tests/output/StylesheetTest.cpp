@@ -2,9 +2,9 @@
 #include "output/Stylesheet.h"
 
 #include "OutputContext.h"
-#include "TestRegistry.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/TestFiles.h"
+#include "testutil/TestMain.h"
 
 #include <QTemporaryDir>
 #include <QTest>
@@ -143,5 +143,5 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_REGISTER_TEST(StylesheetTest)
+ZORBIN_TEST_CLASS(StylesheetTest)
 #include "StylesheetTest.moc"

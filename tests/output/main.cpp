@@ -1,16 +1,15 @@
-// Runs every test class of the output module; QtTest's options apply to each class.
-#include "TestRegistry.h"
+#include "testutil/TestMain.h"
 
 #include <QCoreApplication>
-#include <QTest>
 
-int main(int argc, char *argv[])
-{
-    QCoreApplication app(argc, argv);
-    int failed = 0;
-    for (const auto &make : zorbin::test::registeredTests()) {
-        const auto test = make();
-        failed += QTest::qExec(test.get(), argc, argv);
-    }
-    return failed == 0 ? 0 : 1;
-}
+ZORBIN_DECLARE_TEST(CatalogQueryTest)
+ZORBIN_DECLARE_TEST(EncodingTest)
+ZORBIN_DECLARE_TEST(FileNamingTest)
+ZORBIN_DECLARE_TEST(StylesheetTest)
+
+ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
+ZORBIN_TEST_ADD(CatalogQueryTest)
+ZORBIN_TEST_ADD(EncodingTest)
+ZORBIN_TEST_ADD(FileNamingTest)
+ZORBIN_TEST_ADD(StylesheetTest)
+ZORBIN_TEST_MAIN_END
