@@ -156,12 +156,26 @@ private Q_SLOTS:
         QCOMPARE(infoOf(jpegWithFrame(0xC0, {{static_cast<uchar>(marker), length}})), jpeg200x300());
     }
 
+    void findsTheJpegStartBehindAWrapper_data()
+    {
+        QTest::addColumn<qsizetype>("wrapper");
+        QTest::addColumn<bool>("found");
+        QTest::newRow("128 bytes") << qsizetype(128) << true;
+        // The search reads in blocks of 4096 bytes: a start sequence across two blocks.
+        QTest::newRow("across blocks 1") << qsizetype(4093) << true;
+        QTest::newRow("across blocks 2") << qsizetype(4094) << true;
+        QTest::newRow("across blocks 3") << qsizetype(4095) << true;
+        QTest::newRow("last place within the limit") << qsizetype(JpegSearchLimit - 1) << true;
+        // Past the search limit the data is not taken for a picture.
+        QTest::newRow("beyond the limit") << qsizetype(JpegSearchLimit) << false;
+    }
     void findsTheJpegStartBehindAWrapper()
     {
+        QFETCH(qsizetype, wrapper);
+        QFETCH(bool, found);
         const QByteArray jpeg = testPictureBytes(QStringLiteral("baseline-exif.jpg"));
-        QCOMPARE(infoOf(QByteArray(128, '\0') + jpeg), (ImageInfo{ImageInfo::JPEG, 640, 480}));
-        // Past the search limit the data is not taken for a picture.
-        QCOMPARE(infoOf(QByteArray(JpegSearchLimit, '\0') + jpeg), ImageInfo{});
+        const ImageInfo expected = found ? ImageInfo{ImageInfo::JPEG, 640, 480} : ImageInfo{};
+        QCOMPARE(infoOf(QByteArray(wrapper, '\0') + jpeg), expected);
     }
 
     void damagedDataIsNotRecognised_data()

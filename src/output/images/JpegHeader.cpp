@@ -2,6 +2,7 @@
 #include "output/images/PictureHeaders.h"
 
 #include <algorithm>
+#include <array>
 
 namespace zorbin::images {
 namespace {
@@ -23,14 +24,22 @@ std::int64_t FindJPEGStart(HeaderBytes &bytes)
     // A JPEG file starts with the marker sequence at position 0; the search also accepts it a
     // little later, behind a small wrapper that some tools put before the picture. It stops at
     // JpegSearchLimit so that a large file of another kind (a video or an archive named like a
-    // picture) is not read to its end, and it reads through the block buffer, each byte once.
+    // picture) is not read to its end. It reads through the block buffer, each byte once (but two
+    // at each block's edge).
     const std::int64_t lastStart = std::min(bytes.size() - 3, JpegSearchLimit - 1);
-    for (std::int64_t position = 0; position <= lastStart; ++position) {
-        const std::uint8_t *start = bytes.bytesAt(position, 3);
-        if (!start)
+    constexpr std::array<std::uint8_t, 3> startSequence{MarkerPrefix, StartOfImage, MarkerPrefix};
+    std::int64_t position = 0;
+    while (position <= lastStart) {
+        const std::int64_t length = std::min(HeaderBytes::BlockSize, lastStart + 3 - position);
+        const std::uint8_t *chunk = bytes.bytesAt(position, length);
+        if (!chunk)
             return -1;
-        if (start[0] == MarkerPrefix && start[1] == StartOfImage && start[2] == MarkerPrefix)
-            return position;
+        const std::uint8_t *found =
+            std::search(chunk, chunk + length, startSequence.begin(), startSequence.end());
+        if (found != chunk + length)
+            return position + (found - chunk);
+        // The next chunk overlaps this one by two bytes: a sequence may straddle them.
+        position += length - 2;
     }
     return -1;
 }
