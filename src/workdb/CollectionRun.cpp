@@ -1,4 +1,4 @@
-// Stand-in until the collection is written.
+// Stand-in until the collection steps are written.
 #include "workdb/CollectionRun.h"
 
 namespace zorbin {
