@@ -70,7 +70,7 @@ QString translateBooleanLiterals(const QString &sql)
             const bool isTrue = word.compare(QLatin1String("True"), Qt::CaseInsensitive) == 0;
             const bool isFalse = word.compare(QLatin1String("False"), Qt::CaseInsensitive) == 0;
             if (!qualified && (isTrue || isFalse)) {
-                if (result.endsWith(QLatin1Char('-')))  // "-True" must not become the comment "--1"
+                if (result.endsWith(QLatin1Char('-'))) // "-True" must not become the comment "--1"
                     result += QLatin1Char(' ');
                 result += QString::number(isTrue ? WorkTrue : WorkFalse);
                 i = next;

@@ -12,7 +12,8 @@ namespace {
 // program left behind would otherwise be played back into the new file.
 QStringList filesOfDatabase(const QString &path)
 {
-    return {path, path + QStringLiteral("-journal"), path + QStringLiteral("-wal"), path + QStringLiteral("-shm")};
+    return {path, path + QStringLiteral("-journal"), path + QStringLiteral("-wal"),
+            path + QStringLiteral("-shm")};
 }
 
 } // namespace

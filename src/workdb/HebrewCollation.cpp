@@ -1,11 +1,10 @@
 #include "workdb/HebrewCollation.h"
 
-#include <sqlite3.h>
-#include <unicode/ucol.h>
-#include <unicode/uchar.h>
-#include <unicode/utf8.h>
-
 #include <memory>
+#include <sqlite3.h>
+#include <unicode/uchar.h>
+#include <unicode/ucol.h>
+#include <unicode/utf8.h>
 
 namespace zorbin {
 namespace {
@@ -24,7 +23,8 @@ CollatorHandle openCollator(QString *error)
     CollatorHandle collator(ucol_open("he", &status));
     if (U_FAILURE(status)) {
         if (error)
-            *error = QStringLiteral("ICU cannot open the Hebrew collation: %1").arg(QLatin1String(u_errorName(status)));
+            *error = QStringLiteral("ICU cannot open the Hebrew collation: %1")
+                         .arg(QLatin1String(u_errorName(status)));
         return nullptr;
     }
     ucol_setStrength(collator.get(), UCOL_SECONDARY);
@@ -99,8 +99,10 @@ int compareHebrew(const QString &left, const QString &right)
     const QByteArray a = left.toUtf8();
     const QByteArray b = right.toUtf8();
     if (!collator)
-        return compareFolded(a.constData(), static_cast<int>(a.size()), b.constData(), static_cast<int>(b.size()));
-    return compareUtf8(collator.get(), a.constData(), static_cast<int>(a.size()), b.constData(), static_cast<int>(b.size()));
+        return compareFolded(a.constData(), static_cast<int>(a.size()), b.constData(),
+                             static_cast<int>(b.size()));
+    return compareUtf8(collator.get(), a.constData(), static_cast<int>(a.size()), b.constData(),
+                       static_cast<int>(b.size()));
 }
 
 } // namespace zorbin

@@ -3,9 +3,8 @@
 #include "workdb/WorkDatabase.h"
 #include "workdb/WorkSchema.h"
 
-#include <sqlite3.h>
-
 #include <limits>
+#include <sqlite3.h>
 
 namespace zorbin {
 namespace {
@@ -56,9 +55,10 @@ RowWriter::RowWriter(WorkDatabase &database, const QString &table, const QString
     QStringList marks;
     for (int i = 0; i < m_columnCount; ++i)
         marks << QStringLiteral("?");
-    const QByteArray sql = QStringLiteral("INSERT INTO %1 (%2) VALUES (%3)")
-                               .arg(table, columns.join(QStringLiteral(", ")), marks.join(QStringLiteral(", ")))
-                               .toUtf8();
+    const QByteArray sql =
+        QStringLiteral("INSERT INTO %1 (%2) VALUES (%3)")
+            .arg(table, columns.join(QStringLiteral(", ")), marks.join(QStringLiteral(", ")))
+            .toUtf8();
     if (sqlite3_prepare_v3(m_handle, sql.constData(), static_cast<int>(sql.size()), SQLITE_PREPARE_PERSISTENT,
                            &m_statement, nullptr) != SQLITE_OK) {
         m_prepareError = QString::fromUtf8(sqlite3_errmsg(m_handle));
@@ -78,12 +78,14 @@ WriteOutcome RowWriter::write(std::span<const QVariant> values)
     Q_ASSERT(values.size() == static_cast<std::size_t>(m_columnCount));
     for (int i = 0; i < m_columnCount; ++i) {
         if (bindValue(m_statement, i + 1, values[static_cast<std::size_t>(i)]) != SQLITE_OK)
-            return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle), QString::fromUtf8(sqlite3_errmsg(m_handle)));
+            return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
+                                            QString::fromUtf8(sqlite3_errmsg(m_handle)));
     }
     const int rc = sqlite3_step(m_statement);
     WriteOutcome outcome;
     if (rc != SQLITE_DONE)
-        outcome = WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle), QString::fromUtf8(sqlite3_errmsg(m_handle)));
+        outcome = WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
+                                           QString::fromUtf8(sqlite3_errmsg(m_handle)));
     sqlite3_reset(m_statement);
     return outcome;
 }

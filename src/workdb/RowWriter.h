@@ -4,7 +4,6 @@
 
 #include <QStringList>
 #include <QVariant>
-
 #include <span>
 
 struct sqlite3;

@@ -8,7 +8,6 @@
 #include <QFileInfo>
 #include <QSqlDriver>
 #include <QSqlError>
-
 #include <sqlite3.h>
 
 namespace zorbin {
@@ -22,7 +21,8 @@ QString nextConnectionName()
 
 QString describe(const QSqlError &error)
 {
-    const QString text = error.databaseText().trimmed().isEmpty() ? error.text().trimmed() : error.databaseText().trimmed();
+    const QString text =
+        error.databaseText().trimmed().isEmpty() ? error.text().trimmed() : error.databaseText().trimmed();
     return text.isEmpty() ? QStringLiteral("שגיאה לא ידועה בבסיס הנתונים הזמני.") : text;
 }
 
@@ -38,15 +38,16 @@ sqlite3 *sqliteHandle(const QSqlDatabase &db)
 
 WorkDatabase::WorkDatabase(QString connectionName, QString path)
     : m_connectionName(std::move(connectionName)), m_path(std::move(path))
-{
-}
+{}
 
 Result<std::unique_ptr<WorkDatabase>> WorkDatabase::open(const QString &path)
 {
     if (path.isEmpty())
-        return Status::fault(QStringLiteral("בסיס הנתונים הזמני עדיין לא נוצר: יש לאסוף את נתוני הפריטים תחילה."));
+        return Status::fault(
+            QStringLiteral("בסיס הנתונים הזמני עדיין לא נוצר: יש לאסוף את נתוני הפריטים תחילה."));
     if (!QFileInfo(path).isFile())
-        return Status::fault(QStringLiteral("בסיס הנתונים הזמני %1 לא נמצא.").arg(QDir::toNativeSeparators(path)));
+        return Status::fault(
+            QStringLiteral("בסיס הנתונים הזמני %1 לא נמצא.").arg(QDir::toNativeSeparators(path)));
     return connect(path);
 }
 
@@ -62,7 +63,8 @@ Result<std::unique_ptr<WorkDatabase>> WorkDatabase::connect(const QString &path)
     work->m_handle = sqliteHandle(db);
     QString error = QStringLiteral("the SQLite driver gives no handle");
     if (!work->m_handle || !registerHebrewCollation(work->m_handle, &error))
-        return Status::fault(QStringLiteral("לא ניתן להגדיר את סדר המיון העברי בבסיס הנתונים הזמני: %1").arg(error));
+        return Status::fault(
+            QStringLiteral("לא ניתן להגדיר את סדר המיון העברי בבסיס הנתונים הזמני: %1").arg(error));
     return work;
 }
 
@@ -119,7 +121,7 @@ Status WorkDatabase::commit()
         return Status::ok();
     const Status failure = Status::fault(QString::fromUtf8(sqlite3_errmsg(m_handle)));
     if (!sqlite3_get_autocommit(m_handle))
-        m_inTransaction = true;  // still open: a later commit may succeed
+        m_inTransaction = true; // still open: a later commit may succeed
     return failure;
 }
 

@@ -6,7 +6,6 @@
 #include <QSqlDatabase>
 #include <QSqlQuery>
 #include <QString>
-
 #include <memory>
 
 struct sqlite3;

@@ -33,7 +33,7 @@ QString columnDefinition(const WorkColumn &column, bool isKey)
         definition += QStringLiteral(" TEXT COLLATE %1").arg(QLatin1String(HebrewCollationName));
         break;
     case WorkColumn::Long:
-        definition += QStringLiteral(" INT");  // not INTEGER: that would make the key an alias of the row id
+        definition += QStringLiteral(" INT"); // not INTEGER: that would make the key an alias of the row id
         break;
     case WorkColumn::Double:
         definition += QStringLiteral(" REAL");
@@ -45,9 +45,13 @@ QString columnDefinition(const WorkColumn &column, bool isKey)
     if (isKey)
         definition += QStringLiteral(" PRIMARY KEY");
     if (column.type == WorkColumn::Text)
-        definition += QStringLiteral(" CONSTRAINT %1 CHECK (length(%1) <= %2)").arg(column.name).arg(column.size);
+        definition +=
+            QStringLiteral(" CONSTRAINT %1 CHECK (length(%1) <= %2)").arg(column.name).arg(column.size);
     if (column.type == WorkColumn::Boolean)
-        definition += QStringLiteral(" CONSTRAINT %1 CHECK (%1 IN (%2, %3))").arg(column.name).arg(WorkTrue).arg(WorkFalse);
+        definition += QStringLiteral(" CONSTRAINT %1 CHECK (%1 IN (%2, %3))")
+                          .arg(column.name)
+                          .arg(WorkTrue)
+                          .arg(WorkFalse);
     return definition;
 }
 
@@ -65,9 +69,9 @@ const std::vector<WorkTable> &workTables()
 {
     static const std::vector<WorkTable> tables = {
         {QStringLiteral("tItems"),
-         {text("ItemKey", 20), text("ItemName", 100), column("ItemSort", WorkColumn::Long), text("Filter", 10),
-          text("Unit", 5), column("SellPrice", WorkColumn::Double), text("SellCoin", 5), text("ItemPic", 250),
-          column("Include", WorkColumn::Boolean)}},
+         {text("ItemKey", 20), text("ItemName", 100), column("ItemSort", WorkColumn::Long),
+          text("Filter", 10), text("Unit", 5), column("SellPrice", WorkColumn::Double), text("SellCoin", 5),
+          text("ItemPic", 250), column("Include", WorkColumn::Boolean)}},
         priceTable("tItemPrice1"),
         priceTable("tItemPrice2"),
         noteTable("tExtraNote1"),
@@ -102,7 +106,8 @@ QString createTableStatement(const WorkTable &table)
     QStringList definitions;
     for (std::size_t i = 0; i < table.columns.size(); ++i)
         definitions << columnDefinition(table.columns[i], i == 0);
-    return QStringLiteral("CREATE TABLE %1 (%2) STRICT").arg(table.name, definitions.join(QStringLiteral(", ")));
+    return QStringLiteral("CREATE TABLE %1 (%2) STRICT")
+        .arg(table.name, definitions.join(QStringLiteral(", ")));
 }
 
 } // namespace zorbin

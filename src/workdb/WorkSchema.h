@@ -2,7 +2,6 @@
 
 #include <QString>
 #include <QStringList>
-
 #include <optional>
 #include <vector>
 
@@ -17,13 +16,13 @@ struct WorkColumn
 
     QString name;
     Type type;
-    int size = 0;  // characters, for Text; 0 otherwise
+    int size = 0; // characters, for Text; 0 otherwise
 };
 
 struct WorkTable
 {
     QString name;
-    std::vector<WorkColumn> columns;  // the first is the primary key
+    std::vector<WorkColumn> columns; // the first is the primary key
 
     const WorkColumn &key() const { return columns.front(); }
     QStringList columnNames() const;

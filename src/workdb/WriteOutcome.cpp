@@ -3,7 +3,6 @@
 #include "workdb/WorkSchema.h"
 
 #include <QRegularExpression>
-
 #include <sqlite3.h>
 
 namespace zorbin {
@@ -37,8 +36,9 @@ WriteOutcome checkFailure(const QString &message)
     if (column == QLatin1String("Include"))
         return WriteOutcome::refused(Refusal::WrongKind, booleanMessage());
     if (const std::optional<int> size = workTextSize(column))
-        return WriteOutcome::refused(Refusal::TooLong,
-                                     QStringLiteral("הטקסט ארוך מדי לשדה %1, שמקבל עד %2 תווים.").arg(column).arg(*size));
+        return WriteOutcome::refused(
+            Refusal::TooLong,
+            QStringLiteral("הטקסט ארוך מדי לשדה %1, שמקבל עד %2 תווים.").arg(column).arg(*size));
     return WriteOutcome::refused(Refusal::Other, message);
 }
 
@@ -61,8 +61,9 @@ WriteOutcome WriteOutcome::fromEngine(int extendedCode, const QString &engineMes
     case SQLITE_CONSTRAINT_PRIMARYKEY:
     case SQLITE_CONSTRAINT_UNIQUE: {
         const auto [table, column] = namedColumn(engineMessage);
-        return refused(Refusal::DuplicateKey,
-                       QStringLiteral("בטבלה %1 כבר קיימת רשומה עם אותו ערך בשדה המפתח %2.").arg(table, column));
+        return refused(
+            Refusal::DuplicateKey,
+            QStringLiteral("בטבלה %1 כבר קיימת רשומה עם אותו ערך בשדה המפתח %2.").arg(table, column));
     }
     case SQLITE_CONSTRAINT_CHECK:
         return checkFailure(engineMessage);
@@ -73,12 +74,14 @@ WriteOutcome WriteOutcome::fromEngine(int extendedCode, const QString &engineMes
         if (column == QLatin1String("Include"))
             return refused(Refusal::WrongKind, booleanMessage());
         if (!column.isEmpty())
-            return refused(Refusal::Other, QStringLiteral("השדה %1 בטבלה %2 אינו יכול להישאר ריק.").arg(column, table));
+            return refused(Refusal::Other,
+                           QStringLiteral("השדה %1 בטבלה %2 אינו יכול להישאר ריק.").arg(column, table));
         return refused(Refusal::Other, engineMessage);
     }
     default:
-        return refused(Refusal::Other, engineMessage.isEmpty() ? QStringLiteral("שגיאה לא ידועה בבסיס הנתונים הזמני.")
-                                                               : engineMessage);
+        return refused(Refusal::Other, engineMessage.isEmpty()
+                                           ? QStringLiteral("שגיאה לא ידועה בבסיס הנתונים הזמני.")
+                                           : engineMessage);
     }
 }
 

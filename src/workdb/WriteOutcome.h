@@ -8,11 +8,11 @@ namespace zorbin {
 
 // Why the working database refused a write.
 enum class Refusal {
-    None,          // nothing was refused
-    DuplicateKey,  // the table already holds a row with that key (letter case aside)
-    TooLong,       // a text longer than its column allows
-    WrongKind,     // a value of the wrong kind for its column, such as a text for a number
-    Other,         // anything else: the file, the disk, the statement itself
+    None,         // nothing was refused
+    DuplicateKey, // the table already holds a row with that key (letter case aside)
+    TooLong,      // a text longer than its column allows
+    WrongKind,    // a value of the wrong kind for its column, such as a text for a number
+    Other,        // anything else: the file, the disk, the statement itself
 };
 
 // The outcome of a statement that writes. A refusal carries a description for the user: in
@@ -20,7 +20,7 @@ enum class Refusal {
 class [[nodiscard]] WriteOutcome
 {
 public:
-    WriteOutcome() = default;  // written
+    WriteOutcome() = default; // written
     static WriteOutcome refused(Refusal refusal, QString description)
     {
         WriteOutcome outcome;

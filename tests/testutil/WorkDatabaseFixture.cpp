@@ -19,7 +19,8 @@ Status writeRows(WorkDatabase &work, const QString &table, const QList<QVariantL
     RowWriter writer(work, table, definition->columnNames());
     for (const QVariantList &row : rows) {
         if (row.size() != static_cast<qsizetype>(definition->columns.size()))
-            return Status::fault(QStringLiteral("a row of %1 needs %2 values").arg(table).arg(definition->columns.size()));
+            return Status::fault(
+                QStringLiteral("a row of %1 needs %2 values").arg(table).arg(definition->columns.size()));
         if (WriteOutcome written = writer.write(row); !written)
             return Status::fault(QStringLiteral("%1: %2").arg(table, written.description()));
     }
@@ -60,9 +61,9 @@ QList<QVariantList> readWorkTable(const QString &path, const QString &table)
     if (!definition || !work)
         return rows;
     {
-        Result<QSqlQuery> query = work.value()->select(QStringLiteral("SELECT %1 FROM %2 ORDER BY %3")
-                                                           .arg(definition->columnNames().join(QStringLiteral(", ")),
-                                                                table, definition->key().name));
+        Result<QSqlQuery> query = work.value()->select(
+            QStringLiteral("SELECT %1 FROM %2 ORDER BY %3")
+                .arg(definition->columnNames().join(QStringLiteral(", ")), table, definition->key().name));
         if (!query)
             return rows;
         while (query->next()) {

@@ -13,6 +13,9 @@ namespace zorbin::test {
 // picture, Null for a missing sort group, filter or price, and marked for the catalog.
 struct WorkItem
 {
+    WorkItem() = default;
+    explicit WorkItem(QString itemKey) : key(std::move(itemKey)) {}
+
     QString key;
     QVariant name = QStringLiteral("?");
     QVariant sort;
@@ -34,7 +37,7 @@ struct WorkItem
 struct WorkRows
 {
     QList<WorkItem> items;
-    QMap<QString, QList<QVariantList>> other;  // table name -> rows, for the five other tables
+    QMap<QString, QList<QVariantList>> other; // table name -> rows, for the five other tables
 };
 
 // Creates a fresh working database at `path` (replacing a file there) through the program's

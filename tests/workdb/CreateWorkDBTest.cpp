@@ -1,0 +1,92 @@
+#include "control/CatalogSettings.h"
+#include "control/RunContext.h"
+#include "control/RunState.h"
+#include "source/ConnectionParams.h"
+#include "testutil/FaultyFileSystem.h"
+#include "testutil/RecordingUserPort.h"
+#include "testutil/TestFiles.h"
+#include "testutil/TestMain.h"
+#include "testutil/WorkDatabaseFixture.h"
+#include "workdb/WorkDatabase.h"
+#include "workdb/WorkDatabasePath.h"
+
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace zorbin;
+using namespace zorbin::test;
+
+class CreateWorkDBTest : public QObject
+{
+    Q_OBJECT
+
+private:
+    QTemporaryDir m_temp;
+    QByteArray m_oldTemp;
+    CatalogSettings m_settings;
+    ConnectionParams m_connection;
+    RunState m_state;
+    RecordingUserPort m_user;
+    FaultyFileSystem m_files;
+    RunContext m_context{m_settings, m_connection, m_state, m_user, m_files};
+
+    QString expectedPath() const { return m_temp.filePath(QStringLiteral("zorbindb.tmp")); }
+
+private Q_SLOTS:
+    void initTestCase()
+    {
+        QVERIFY(m_temp.isValid());
+        m_oldTemp = qgetenv("TMPDIR");
+        qputenv("TMPDIR", QFile::encodeName(m_temp.path()));
+    }
+    void cleanupTestCase() { qputenv("TMPDIR", m_oldTemp); }
+    void init()
+    {
+        m_user = RecordingUserPort();
+        m_files.failingPaths.clear();
+    }
+
+    void createsTheFileInTheTemporaryFolder()
+    {
+        QCOMPARE(workDatabasePath(), expectedPath());
+        QCOMPARE(CreateWorkDB(m_context), expectedPath());
+        QVERIFY(m_user.messages.isEmpty());
+        for (const QString &table : {QStringLiteral("tItems"), QStringLiteral("tItemSort")})
+            QCOMPARE(readWorkTable(expectedPath(), table).size(), 0);
+    }
+
+    void replacesTheDatabaseOfTheLastRun()
+    {
+        WorkRows rows;
+        rows.items << WorkItem{QStringLiteral("old")};
+        rows.other[QStringLiteral("tItemSort")] << QVariantList{1, QStringLiteral("old group")};
+        QVERIFY(makeWorkDatabase(expectedPath(), rows));
+        writeFile(expectedPath() + QStringLiteral("-journal"), QByteArray(512, 'j'));
+        QCOMPARE(CreateWorkDB(m_context), expectedPath());
+        QVERIFY(!QFile::exists(expectedPath() + QStringLiteral("-journal")));
+        QCOMPARE(readWorkTable(expectedPath(), QStringLiteral("tItems")).size(), 0);
+        QCOMPARE(readWorkTable(expectedPath(), QStringLiteral("tItemSort")).size(), 0);
+    }
+
+    void anOldFileThatCannotBeDeletedIsAFault()
+    {
+        QVERIFY(makeWorkDatabase(expectedPath()));
+        m_files.failingPaths.insert(expectedPath());
+        QCOMPARE(CreateWorkDB(m_context), QString());
+        QCOMPARE(m_user.messages.size(), 1);
+        QCOMPARE(m_user.messages[0].title, QStringLiteral("תקלה"));
+        QCOMPARE(m_user.messages[0].icon, MessageIcon::Critical);
+        QVERIFY(m_user.messages[0].text.contains(expectedPath()));
+    }
+
+    void aFolderThatCannotBeWrittenIsAFault()
+    {
+        const QString path = m_temp.filePath(QStringLiteral("no such folder/zorbindb.tmp"));
+        const Status created = createWorkDatabase(m_files, path);
+        QVERIFY(!created);
+        QVERIFY(created.description().contains(QStringLiteral("לא ניתן לפתוח")));
+    }
+};
+
+ZORBIN_TEST_CLASS(CreateWorkDBTest)
+#include "CreateWorkDBTest.moc"

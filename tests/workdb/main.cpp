@@ -1,0 +1,13 @@
+#include "testutil/TestMain.h"
+
+#include <QCoreApplication>
+
+ZORBIN_DECLARE_TEST(BooleanLiteralsTest)
+ZORBIN_DECLARE_TEST(WorkDatabaseTest)
+ZORBIN_DECLARE_TEST(CreateWorkDBTest)
+
+ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
+ZORBIN_TEST_ADD(BooleanLiteralsTest)
+ZORBIN_TEST_ADD(WorkDatabaseTest)
+ZORBIN_TEST_ADD(CreateWorkDBTest)
+ZORBIN_TEST_MAIN_END
