@@ -1,7 +1,12 @@
 #include "source/SourceConnection.h"
 
+#include "source/ConnectionString.h"
+#include "source/DatabaseFile.h"
+#include "source/OdbcTableReader.h"
+#include "source/SourceFaults.h"
+
 #include <QAtomicInteger>
-#include <QFile>
+#include <QDir>
 #include <QSqlError>
 
 namespace zorbin {
@@ -13,32 +18,43 @@ QString nextConnectionName()
     return QStringLiteral("zorbin-source-%1").arg(++counter);
 }
 
-QString describe(const QSqlError &error)
+bool isJetProvider(const QString &provider)
 {
-    QString text = error.text().trimmed();
-    return text.isEmpty() ? QStringLiteral("שגיאה לא ידועה בגישה לבסיס הנתונים.") : text;
+    return provider.startsWith(QLatin1String("Microsoft.Jet"), Qt::CaseInsensitive) ||
+           provider.startsWith(QLatin1String("Microsoft.ACE"), Qt::CaseInsensitive);
 }
 
-// The value of one "name=value" part of a connection text, or the empty text.
-QString connectionPart(const QString &connectionString, const QString &name)
+bool isSqlServerProvider(const QString &provider)
 {
-    for (const QString &part : connectionString.split(QLatin1Char(';'))) {
-        const qsizetype equals = part.indexOf(QLatin1Char('='));
-        if (equals > 0 && part.left(equals).trimmed().compare(name, Qt::CaseInsensitive) == 0)
-            return part.mid(equals + 1).trimmed();
+    for (const char *name : {"sqloledb", "sqlncli", "msoledbsql"}) {
+        if (provider.startsWith(QLatin1String(name), Qt::CaseInsensitive))
+            return true;
     }
-    return {};
+    return false;
 }
 
-bool isSqliteFile(const QString &path)
+// One SELECT statement: it starts with SELECT, and no ";" outside a quoted text or name is
+// followed by anything but blanks. A second statement could change the accounting data.
+bool isSingleSelect(const QString &sql)
 {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) && file.read(16) == QByteArray("SQLite format 3\0", 16);
-}
-
-bool isSelectStatement(const QString &sql)
-{
-    return sql.trimmed().startsWith(QLatin1String("SELECT"), Qt::CaseInsensitive);
+    const QString text = sql.trimmed();
+    if (!text.startsWith(QLatin1String("SELECT"), Qt::CaseInsensitive))
+        return false;
+    QChar closing; // the mark that ends the quoted text or name we are in, or none
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const QChar c = text.at(i);
+        if (!closing.isNull()) {
+            if (c == closing)
+                closing = QChar(); // a doubled mark closes and reopens: the same result
+        } else if (c == QLatin1Char('\'') || c == QLatin1Char('"')) {
+            closing = c;
+        } else if (c == QLatin1Char('[')) {
+            closing = QLatin1Char(']');
+        } else if (c == QLatin1Char(';') && !text.mid(i + 1).trimmed().isEmpty()) {
+            return false;
+        }
+    }
+    return true;
 }
 
 } // namespace
@@ -46,26 +62,23 @@ bool isSelectStatement(const QString &sql)
 Result<std::unique_ptr<SourceConnection>> SourceConnection::open(const QString &connectionString)
 {
     if (connectionString.isEmpty())
-        return Status::fault(QStringLiteral("לא נבחר סוג בסיס הנתונים בהגדרות ההתחברות."));
+        return Status::fault(noConnectionTypeFault());
 
-    const QString name = nextConnectionName();
-    std::unique_ptr<SourceConnection> connection(new SourceConnection(name));
-    QSqlDatabase db;
-    if (connectionString.startsWith(QLatin1String("Provider=Microsoft.Jet.OLEDB"), Qt::CaseInsensitive)) {
-        const QString path = connectionPart(connectionString, QStringLiteral("Data Source"));
-        if (!isSqliteFile(path))
-            return Status::fault(QStringLiteral("הקובץ %1 אינו בסיס נתונים מוכר.").arg(path));
-        db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name);
-        db.setDatabaseName(path);
-        db.setConnectOptions(QStringLiteral("QSQLITE_OPEN_READONLY"));
+    std::unique_ptr<SourceConnection> connection(new SourceConnection(nextConnectionName()));
+    Status opened;
+    if (!isOleDbConnString(connectionString)) {
+        opened = connection->openOdbc(connectionString);
     } else {
-        db = QSqlDatabase::addDatabase(QStringLiteral("QODBC"), name);
-        db.setDatabaseName(connectionString);
-        db.setConnectOptions(QStringLiteral("SQL_ATTR_LOGIN_TIMEOUT=%1;SQL_ATTR_ACCESS_MODE=SQL_MODE_READ_ONLY")
-                                 .arg(LoginTimeoutSeconds));
+        const QString provider = connStringValue(connectionString, QStringLiteral("Provider"));
+        if (isJetProvider(provider))
+            opened = connection->openFile(connStringValue(connectionString, QStringLiteral("Data Source")));
+        else if (isSqlServerProvider(provider))
+            opened = connection->openOdbc(odbcConnStringForOleDb(connectionString));
+        else
+            opened = Status::fault(unknownProviderFault(provider));
     }
-    if (!db.open())
-        return Status::fault(describe(db.lastError()));
+    if (!opened)
+        return opened;
     return connection;
 }
 
@@ -85,15 +98,54 @@ QSqlDatabase SourceConnection::database() const
     return QSqlDatabase::database(m_connectionName, false);
 }
 
+Status SourceConnection::openOdbc(const QString &odbcConnectionString)
+{
+    QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QODBC"), m_connectionName);
+    db.setDatabaseName(odbcConnectionString);
+    db.setConnectOptions(QStringLiteral("SQL_ATTR_LOGIN_TIMEOUT=%1;SQL_ATTR_ACCESS_MODE=SQL_MODE_READ_ONLY")
+                             .arg(LoginTimeoutSeconds));
+    if (db.open())
+        return Status::ok();
+    return Status::fault(odbcOpenFault(sqlErrorText(db.lastError()), odbcConnectionString));
+}
+
+Status SourceConnection::openFile(const QString &path)
+{
+    m_filePath = path;
+    switch (databaseFileKind(path)) {
+    case DatabaseFileKind::Missing:
+        return Status::fault(missingFileFault(path));
+    case DatabaseFileKind::Other:
+        return Status::fault(unknownFileFault(path));
+    case DatabaseFileKind::Jet:
+        return openJetFile(path);
+    case DatabaseFileKind::Sqlite:
+        break;
+    }
+    QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_connectionName);
+    db.setDatabaseName(path);
+    db.setConnectOptions(QStringLiteral("QSQLITE_OPEN_READONLY"));
+    if (db.open())
+        return Status::ok();
+    return Status::fault(sqlErrorText(db.lastError()));
+}
+
 Result<QSqlQuery> SourceConnection::select(const QString &sql)
 {
-    if (!isSelectStatement(sql))
-        return Status::fault(QStringLiteral("רק שאילתות SELECT נשלחות לבסיס הנתונים של הנהלת החשבונות."));
-    QSqlQuery query(database());
-    query.setForwardOnly(true);
-    if (!query.exec(sql))
-        return Status::fault(describe(query.lastError()));
-    return query;
+    if (!isSingleSelect(sql))
+        return Status::fault(notSelectFault());
+    for (;;) {
+        QSqlQuery query(database());
+        query.setForwardOnly(true);
+        if (query.exec(sql))
+            return query;
+        // A Jet file's tables are copied when a statement first names them.
+        const QString missing = m_jetFile ? missingTableOf(query.lastError()) : QString();
+        if (missing.isEmpty() || m_copiedTables.contains(missing.toLower()))
+            return Status::fault(sqlErrorText(query.lastError()));
+        if (Status copied = copyJetTable(missing); !copied)
+            return copied;
+    }
 }
 
 } // namespace zorbin
