@@ -1,7 +1,5 @@
 // Stand-ins until the output writers are written.
-#include "output/CatalogPages.h"
 #include "output/ImageCollection.h"
-#include "output/ListPage.h"
 
 namespace zorbin {
 namespace {
@@ -12,14 +10,6 @@ Status missing()
 } // namespace
 
 Status CollectCatImages(RunContext &, const QString &, const QString &)
-{
-    return missing();
-}
-Result<QString> CreateCatHTML(RunContext &, const QString &, const QString &, const QString &)
-{
-    return missing();
-}
-Status CreateListHTML(RunContext &, const QString &, const QString &)
 {
     return missing();
 }
