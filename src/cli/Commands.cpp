@@ -92,15 +92,16 @@ std::optional<int> checkSettingsFile(const QCommandLineParser &parser)
 
 int finish(const RunOutcome &outcome, const RunState &state)
 {
+    // A collection step that failed has told its fault; whatever was written from the rows
+    // collected before it does not hold everything the settings asked for.
+    const int collected = state.CollectFailed ? Failure : Success;
     switch (outcome.ending) {
     case RunOutcome::Ending::Shown:
         out() << QDir::toNativeSeparators(outcome.file) << '\n';
         out().flush();
-        // Steps that failed during the collection have told their fault; the output exists
-        // but does not hold everything the settings asked for.
-        return state.CollectFailed ? Failure : Success;
+        return collected;
     case RunOutcome::Ending::NoItems:
-        return EmptyCatalog;
+        return state.CollectFailed ? Failure : EmptyCatalog;
     case RunOutcome::Ending::Failed:
         if (!outcome.file.isEmpty())
             out() << QDir::toNativeSeparators(outcome.file) << '\n';
