@@ -83,7 +83,7 @@ private Q_SLOTS:
         file.close();
         const Run run = runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
         QCOMPARE(run.exitCode, 1);
-        QVERIFY2(run.err.contains(QStringLiteral("missing.db")), qPrintable(run.err));
+        QVERIFY2(run.err.contains(QStringLiteral("תקלה")), qPrintable(run.err));
     }
 };
 
