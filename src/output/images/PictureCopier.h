@@ -31,7 +31,7 @@ public:
 private:
     FileSystem &m_files;
     CopiedPictures m_record;
-    QHash<QString, QString> m_sourceOf;  // target -> the source last copied there
+    QHash<QString, QString> m_sourceOf; // target -> the source last copied there
     int m_copies = 0;
 };
 
