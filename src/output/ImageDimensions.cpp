@@ -35,6 +35,8 @@ ImageInfo GetImageInfo(QIODevice &device)
 
 ImageInfo GetImageInfo(const FileSystem &files, const QString &path)
 {
+    if (path.isEmpty())
+        return {};
     auto device = files.openForReading(path);
     if (!device)
         return {};

@@ -191,7 +191,8 @@ private Q_SLOTS:
         Catalog catalog;
         const QStringList two = picturesNamed(catalog, 2);
         QStringList references;
-        for (int i = 0; i < 1000; ++i)
+        // 100 items (the fixture writes a row at a time): each picture is copied once.
+        for (int i = 0; i < 100; ++i)
             references << two.at(i % 2 == 0 ? 0 : 1);
         catalog.makeItems(references);
         QVERIFY(catalog.collect().isOk());
