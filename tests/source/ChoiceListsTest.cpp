@@ -1,0 +1,217 @@
+#include "source/ChoiceLists.h"
+
+#include "DemoExpectations.h"
+#include "control/CatalogControl.h"
+#include "platform/FileSystem.h"
+#include "platform/SettingsStore.h"
+#include "testutil/AccountingFixture.h"
+#include "testutil/RecordingUserPort.h"
+#include "testutil/TestMain.h"
+
+#include <QFile>
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace zorbin;
+using namespace zorbin::test;
+
+namespace {
+
+const Entries DemoNotes = demoNoteEntries();
+const Entries DemoPriceLists = demoPriceListEntries();
+
+// Puts one entry into each of the five lists and selects it, to see whether a filling touched them.
+void markLists(CatalogSettings &settings)
+{
+    for (ChoiceList *list : settings.sourceLists()) {
+        list->clear();
+        list->addEntry(QStringLiteral("earlier"), 99);
+        list->setCurrentIndex(0);
+    }
+}
+
+bool listsAreMarked(CatalogSettings &settings)
+{
+    for (ChoiceList *list : settings.sourceLists()) {
+        if (entriesOf(*list) != Entries{{QStringLiteral("earlier"), 99}} || list->currentIndex() != 0)
+            return false;
+    }
+    return true;
+}
+
+} // namespace
+
+class ChoiceListsTest : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void fillsTheListsFromTheDemoDatabase()
+    {
+        QTemporaryDir folder;
+        const ConnectionParams demo = fileConnection(copyDemoDatabase(folder.path()));
+        CatalogSettings settings;
+        markLists(settings);
+        FillCmbExtraNote(demo, settings);
+        FillCmbPriceField(demo, settings);
+        // Ascending NoteID; kinds of other owners, blank, empty and Null names left out; names trimmed.
+        QCOMPARE(entriesOf(settings.cmbPicExtraNote), DemoNotes);
+        QCOMPARE(entriesOf(settings.cmbExtraNote1), DemoNotes);
+        QCOMPARE(entriesOf(settings.cmbExtraNote2), DemoNotes);
+        // The sales price first, then the price lists in the order the table returns them.
+        QCOMPARE(entriesOf(settings.cmbPriceField), DemoPriceLists);
+        QCOMPARE(entriesOf(settings.cmbPriceField2), DemoPriceLists);
+        // Clearing a list drops its selection.
+        QCOMPARE(settings.cmbPriceField.currentIndex(), -1);
+    }
+
+    void followsTheRowsOfTheNamesTables_data()
+    {
+        const QString salesPrice = QStringLiteral("מחיר מכירה");
+        const Entries kept = {{QStringLiteral("earlier"), 99}};
+        QTest::addColumn<QStringList>("rows");
+        QTest::addColumn<Entries>("notes");
+        QTest::addColumn<Entries>("priceLists");
+        QTest::newRow("empty tables") << QStringList() << kept << kept;
+        QTest::newRow("one price list X, number 7")
+            << QStringList{QStringLiteral(
+                   "INSERT INTO PriceListNames (PriceListID, PriceListName) VALUES (7, 'X')")}
+            << kept << Entries{{salesPrice, 0}, {QStringLiteral("X"), 7}};
+        QTest::newRow("only blank names")
+            << QStringList{QStringLiteral(
+                               "INSERT INTO PriceListNames (PriceListID, PriceListName) VALUES (1, ' '), (2, NULL)"),
+                           QStringLiteral("INSERT INTO ExtraNoteNames VALUES (1, '', 1), (2, NULL, 1)")}
+            << Entries{} << Entries{{salesPrice, 0}};
+        QTest::newRow("only note kinds of other owners")
+            << QStringList{QStringLiteral("INSERT INTO ExtraNoteNames VALUES (1, 'a', 0), (2, 'b', 2)")}
+            << kept << kept;
+        QTest::newRow("numbers given as texts and fractions")
+            << QStringList{QStringLiteral(
+                   "INSERT INTO ExtraNoteNames VALUES ('12', 'twelve', 1), (2.5, 'two and a half', 1)")}
+            << Entries{{QStringLiteral("two and a half"), 2}, {QStringLiteral("twelve"), 12}} << kept;
+    }
+    void followsTheRowsOfTheNamesTables()
+    {
+        QFETCH(QStringList, rows);
+        QFETCH(Entries, notes);
+        QFETCH(Entries, priceLists);
+        QTemporaryDir folder;
+        const QString path = folder.filePath(QStringLiteral("accounting.db"));
+        QVERIFY(makeAccountingFile(path, rows));
+        CatalogSettings settings;
+        markLists(settings);
+        FillCmbExtraNote(fileConnection(path), settings);
+        FillCmbPriceField(fileConnection(path), settings);
+        QCOMPARE(entriesOf(settings.cmbPicExtraNote), notes);
+        QCOMPARE(entriesOf(settings.cmbExtraNote1), notes);
+        QCOMPARE(entriesOf(settings.cmbExtraNote2), notes);
+        QCOMPARE(entriesOf(settings.cmbPriceField), priceLists);
+        QCOMPARE(entriesOf(settings.cmbPriceField2), priceLists);
+    }
+
+    // A failure ends the filling at once and silently; what was added so far stays.
+    void stopsAtTheFirstFailure()
+    {
+        QTemporaryDir folder;
+        const QString path = folder.filePath(QStringLiteral("accounting.db"));
+        // A number that does not convert: SQLite orders texts after numbers.
+        QVERIFY(makeAccountingFile(
+            path,
+            {QStringLiteral("INSERT INTO ExtraNoteNames VALUES (1, 'a', 1), ('x', 'b', 1), (3, 'c', 1)")}));
+        CatalogSettings settings;
+        markLists(settings);
+        FillCmbExtraNote(fileConnection(path), settings);
+        QCOMPARE(entriesOf(settings.cmbPicExtraNote),
+                 (Entries{{QStringLiteral("a"), 1}, {QStringLiteral("c"), 3}}));
+        QCOMPARE(entriesOf(settings.cmbExtraNote2),
+                 (Entries{{QStringLiteral("a"), 1}, {QStringLiteral("c"), 3}}));
+
+        // A names table without the name column: the rows are there, the names are not.
+        QVERIFY(makeAccountingFile(
+            path, {QStringLiteral("DROP TABLE PriceListNames"),
+                   QStringLiteral("CREATE TABLE PriceListNames (PriceListID INTEGER, Name TEXT)"),
+                   QStringLiteral("INSERT INTO PriceListNames VALUES (1, 'a')")}));
+        markLists(settings);
+        FillCmbPriceField(fileConnection(path), settings);
+        QCOMPARE(entriesOf(settings.cmbPriceField), (Entries{{QStringLiteral("מחיר מכירה"), 0}}));
+    }
+
+    void nothingChangesWhenTheDatabaseCannotBeReached()
+    {
+        QTemporaryDir folder;
+        ConnectionParams unreachable = fileConnection(folder.filePath(QStringLiteral("missing.db")));
+        CatalogSettings settings;
+        markLists(settings);
+        FillCmbExtraNote(unreachable, settings);
+        FillCmbPriceField(unreachable, settings);
+        unreachable.type = NoConnectionType;
+        FillCmbExtraNote(unreachable, settings);
+        FillCmbPriceField(unreachable, settings);
+        QVERIFY(listsAreMarked(settings));
+    }
+
+    void trimOrEmpty_data()
+    {
+        QTest::addColumn<QVariant>("value");
+        QTest::addColumn<QString>("text");
+        QTest::newRow("Null") << QVariant() << "";
+        QTest::newRow("null text") << QVariant(QMetaType::fromType<QString>()) << "";
+        QTest::newRow("empty") << QVariant(QString()) << "";
+        QTest::newRow("blanks") << QVariant(QStringLiteral("   ")) << "";
+        QTest::newRow("surrounded") << QVariant(QStringLiteral("  מחירון א  ")) << "מחירון א";
+        QTest::newRow("number") << QVariant(7) << "7";
+    }
+    void trimOrEmpty()
+    {
+        QFETCH(QVariant, value);
+        QFETCH(QString, text);
+        QCOMPARE(TrimOrEmpty(value), text);
+    }
+
+    // The control starts on the demo settings: the lists are filled from the demo database
+    // before the stored list indexes are applied, and nothing is said.
+    void startUpFillsTheListsBeforeTheSettings()
+    {
+        QTemporaryDir folder;
+        const QString settingsFile = folder.filePath(QStringLiteral("settings.ini"));
+        QVERIFY(QFile::copy(demoSettingsPath(), settingsFile));
+        QVERIFY(QFile::setPermissions(settingsFile, QFileDevice::ReadOwner | QFileDevice::WriteOwner));
+        auto store = openIniSettingsStore(settingsFile);
+        RecordingUserPort user;
+        CatalogControl control(user, *store, localFileSystem());
+        control.UserControl_Initialize();
+        CatalogSettings &settings = control.settings();
+        QCOMPARE(control.connection().type, std::int16_t(FileConnection));
+        QCOMPARE(entriesOf(settings.cmbPriceField), DemoPriceLists);
+        QCOMPARE(entriesOf(settings.cmbExtraNote2), DemoNotes);
+        QCOMPARE(settings.cmbPriceField.currentIndex(), 1);
+        QCOMPARE(settings.cmbPriceField.currentItemData(), std::optional<std::int32_t>(1));
+        QCOMPARE(settings.cmbExtraNote1.currentIndex(), 1);
+        QCOMPARE(settings.cmbExtraNote1.currentItemData(), std::optional<std::int32_t>(2));
+        QCOMPARE(settings.cmbPicExtraNote.currentItemData(), std::optional<std::int32_t>(3));
+        QVERIFY(control.persistence().unappliedKeys().isEmpty());
+        QVERIFY(user.messages.isEmpty());
+        QVERIFY(user.questions.isEmpty());
+    }
+
+    void startUpWithoutTheDatabaseSaysNothing()
+    {
+        QTemporaryDir folder;
+        const QString settingsFile = folder.filePath(QStringLiteral("settings.ini"));
+        QVERIFY(QFile::copy(demoSettingsPath(), settingsFile));
+        QVERIFY(QFile::setPermissions(settingsFile, QFileDevice::ReadOwner | QFileDevice::WriteOwner));
+        auto store = openIniSettingsStore(settingsFile);
+        store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnServer"),
+                     folder.path());
+        RecordingUserPort user;
+        CatalogControl control(user, *store, localFileSystem());
+        control.UserControl_Initialize();
+        for (ChoiceList *list : control.settings().sourceLists())
+            QCOMPARE(list->count(), 0);
+        QVERIFY(control.persistence().unappliedKeys().contains(QStringLiteral("PriceField")));
+        QVERIFY(user.messages.isEmpty());
+    }
+};
+
+ZORBIN_TEST_CLASS(ChoiceListsTest)
+#include "ChoiceListsTest.moc"
