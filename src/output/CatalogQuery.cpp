@@ -57,31 +57,34 @@ QString columnsOfField(int field, const CatalogSettings &settings)
 
 } // namespace
 
-Result<int> lineFieldNumber(const CellLine &line, int lineIndex)
+Result<std::vector<LineField>> usedLineFields(const CatalogSettings &settings)
 {
-    const auto number =
-        toWholeNumber(line.tag, std::numeric_limits<int>::min(), std::numeric_limits<int>::max());
-    if (!number)
-        return Status::fault(
-            QStringLiteral("שורה %1 בתא מסומנת בשדה \"%2\", שאינו מספר שדה. יש לגרור אל השורה "
-                           "שדה מרשימת השדות או לנקות אותה.")
-                .arg(lineIndex + 1)
-                .arg(line.tag));
-    return static_cast<int>(*number);
+    std::vector<LineField> used;
+    for (int i = 0; i < CellLineCount; ++i) {
+        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
+        if (!line.isUsed())
+            continue;
+        const auto number =
+            toWholeNumber(line.tag, std::numeric_limits<int>::min(), std::numeric_limits<int>::max());
+        if (!number)
+            return Status::fault(QStringLiteral("שורה %1 בתא מסומנת בשדה \"%2\", שאינו מספר שדה. יש לגרור אל "
+                                                "השורה שדה מרשימת השדות או לנקות אותה.")
+                                     .arg(i + 1)
+                                     .arg(line.tag));
+        used.push_back({i, static_cast<int>(*number)});
+    }
+    return used;
 }
 
 Result<QString> BuildSelect(const CatalogSettings &settings)
 {
+    const auto lines = usedLineFields(settings);
+    if (!lines)
+        return lines.status();
     QString select = QStringLiteral("SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort");
     QStringList pieces;
-    for (int i = 0; i < static_cast<int>(settings.lines.size()); ++i) {
-        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
-        if (!line.isUsed())
-            continue;
-        const auto field = lineFieldNumber(line, i);
-        if (!field)
-            return field.status();
-        const QString piece = columnsOfField(field.value(), settings);
+    for (const LineField &line : lines.value()) {
+        const QString piece = columnsOfField(line.field, settings);
         // Two lines may show one field; one copy of its columns serves both.
         if (!piece.isEmpty() && !pieces.contains(piece))
             pieces << piece;

@@ -3,12 +3,11 @@
 #include "common/Status.h"
 
 #include <QString>
-#include <optional>
+#include <vector>
 
 namespace zorbin {
 
 struct CatalogSettings;
-struct CellLine;
 
 // The one statement from which the pages, the picture copying and the item list read the
 // catalog items, in catalog order. Each function reads the settings at the moment of the call
@@ -32,9 +31,16 @@ QString BuildOrderBy(const CatalogSettings &settings);
 // a picture are wanted) + BuildOrderBy.
 Result<QString> BuildFinalSQL(const CatalogSettings &settings);
 
-// The field number a used cell line shows: its tag read as a whole number. A number outside
-// the catalog fields (0 to 8) is returned as it is; callers decide what it shows.
-// Fails, with a message that names the line, when the tag is not a whole number.
-Result<int> lineFieldNumber(const CellLine &line, int lineIndex);
+// A cell line that shows something, and the field number its tag holds. A number outside the
+// catalog fields (0 to 8) is kept as it is; each caller decides what it shows.
+struct LineField
+{
+    int index = 0; // 0 to 8
+    int field = 0;
+};
+
+// The used cell lines (tag not empty) in index order. Fails, with a message that names the
+// line, at the first tag that is not a whole number.
+Result<std::vector<LineField>> usedLineFields(const CatalogSettings &settings);
 
 } // namespace zorbin

@@ -38,21 +38,19 @@ Result<PageLayout> PageLayout::read(const CatalogSettings &settings, const QStri
     layout.topTitle = settings.txtTopTitle;
     layout.topTitle2 = settings.txtTopTitle2;
     layout.bottomTitle = settings.txtBottomTitle;
-    for (int i = 0; i < CellLineCount; ++i) {
-        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
-        if (!line.isUsed())
-            continue;
-        const auto field = lineFieldNumber(line, i);
-        if (!field)
-            return field.status();
-        if (field.value() < 0 || field.value() >= CatalogFieldCount)
+    const auto used = usedLineFields(settings);
+    if (!used)
+        return used.status();
+    for (const LineField &line : used.value()) {
+        if (line.field < 0 || line.field >= CatalogFieldCount)
             return Status::fault(
                 QStringLiteral("שורה %1 בתא מסומנת בשדה %2, ואין שדה כזה (השדות הם 0 עד 8). יש "
                                "לגרור אל השורה שדה מרשימת השדות או לנקות אותה.")
-                    .arg(i + 1)
-                    .arg(field.value()));
-        const CatalogField &catalogField = catalogFields()[static_cast<std::size_t>(field.value())];
-        layout.lines.push_back({i, field.value(), line.caption, catalogField.column});
+                    .arg(line.index + 1)
+                    .arg(line.field));
+        const auto index = static_cast<std::size_t>(line.index);
+        layout.lines.push_back({line.index, line.field, settings.lines[index].caption,
+                                catalogFields()[static_cast<std::size_t>(line.field)].column});
     }
     return layout;
 }

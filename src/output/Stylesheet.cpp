@@ -67,13 +67,9 @@ Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace)
         QStringLiteral("height:") + formatOneDecimal(100.0 / grid->rows) + QStringLiteral("%");
     const QString width =
         QStringLiteral("width:") + formatOneDecimal(100.0 / grid->columns) + QStringLiteral("%");
-    for (int i = 0; i < CellLineCount; ++i) {
-        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
-        if (line.isUsed()) {
-            if (const auto field = lineFieldNumber(line, i); !field)
-                return field.status();
-        }
-    }
+    const auto used = usedLineFields(settings); // the tags must be numbers; their values are not used here
+    if (!used)
+        return used.status();
 
     const QString path = withTrailingSeparator(outputFolder) + StylesheetName;
     if (!replace && context.files.fileExists(path))
@@ -93,11 +89,8 @@ Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace)
     css.writeLine(u".Top1 {font-family:Arial; font-weight:Normal; font-size:12pt; color:black;}");
     css.writeLine(u".Top2 {font-family:Arial; font-weight:Normal; font-size:11pt; color:black;}");
     css.writeLine(u".Bot1 {font-family:Arial; font-weight:Normal; font-size:11pt; color:black;}");
-    for (int i = 0; i < CellLineCount; ++i) {
-        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
-        if (line.isUsed())
-            writeLineClass(css, i, line.format);
-    }
+    for (const LineField &line : used.value())
+        writeLineClass(css, line.index, settings.lines[static_cast<std::size_t>(line.index)].format);
     css.write(QStringLiteral(" .D1 {") + width + QStringLiteral("; ") + height +
               QStringLiteral("; text-align: center"));
     if (isTicked(settings.chkRules))
