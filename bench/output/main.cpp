@@ -3,7 +3,7 @@
 // pictures) in both page modes, and measures, in the same run and the same folder, how fast
 // this machine writes the same number of bytes: the floor that the writers are held against.
 //
-//   output-benchmark [--items N] [--pictures N] [--folder DIR]
+//   output-benchmark [--items N] [--pictures N] [--folder DIR] [--mode one-file|file-per-page|both]
 #include "BenchCatalog.h"
 #include "CountingFileSystem.h"
 #include "MemoryUse.h"
@@ -70,21 +70,25 @@ Measure folderContents(const QString &folder)
     return measure;
 }
 
-// Writes `bytes` bytes into one new file in `folder`, 64 kB a write, and removes it again.
-double floorSeconds(const QString &folder, qint64 bytes)
+// Writes `bytes` bytes into `files` new files in `folder`, 64 kB a write, and removes them again.
+double floorSeconds(const QString &folder, qint64 bytes, qint64 files)
 {
     const QByteArray block(64 * 1024, 'x');
-    const QString path = folder + QStringLiteral("floor.bin");
+    QStringList paths;
     QElapsedTimer timer;
     timer.start();
-    QFile file(path);
-    if (!file.open(QIODevice::WriteOnly | QIODevice::Truncate))
-        qFatal("cannot write %s", qPrintable(path));
-    for (qint64 left = bytes; left > 0; left -= block.size())
-        file.write(block.constData(), std::min<qint64>(left, block.size()));
-    file.close();
+    for (qint64 i = 0; i < files; ++i) {
+        paths << folder + QStringLiteral("floor%1.bin").arg(i);
+        QFile file(paths.last());
+        if (!file.open(QIODevice::WriteOnly | QIODevice::Truncate))
+            qFatal("cannot write %s", qPrintable(paths.last()));
+        const qint64 share = bytes / files + (i < bytes % files ? 1 : 0);
+        for (qint64 left = share; left > 0; left -= block.size())
+            file.write(block.constData(), std::min<qint64>(left, block.size()));
+    }
     const double seconds = timer.nsecsElapsed() / 1e9;
-    QFile::remove(path);
+    for (const QString &path : paths)
+        QFile::remove(path);
     return seconds;
 }
 
@@ -108,7 +112,10 @@ int main(int argc, char *argv[])
     const QCommandLineOption folderOption(QStringLiteral("folder"),
                                           QStringLiteral("work folder (default: a new temporary one)"),
                                           QStringLiteral("DIR"));
-    parser.addOptions({itemsOption, picturesOption, folderOption});
+    const QCommandLineOption modeOption(QStringLiteral("mode"),
+                                        QStringLiteral("one-file, file-per-page or both"),
+                                        QStringLiteral("MODE"), QStringLiteral("both"));
+    parser.addOptions({itemsOption, picturesOption, folderOption, modeOption});
     parser.process(app);
     const int items = parser.value(itemsOption).toInt();
     const int pictureCount = parser.value(picturesOption).toInt();
@@ -138,9 +145,11 @@ int main(int argc, char *argv[])
     RunContext context{settings, connection, state, user, files};
     fail(ensureFolder(files, output));
 
-    std::printf("\n%-14s %8s %9s %10s %8s %10s %9s %10s %8s %9s\n", "mode", "pages", "seconds", "pages/s",
-                "MB", "MB/s", "floor MB/s", "x floor", "headers", "peak MB");
+    const QString modes = parser.value(modeOption);
     for (const int mode : {0, 1}) {
+        if (modes != QLatin1String("both") &&
+            modes != QLatin1String(mode == 0 ? "one-file" : "file-per-page"))
+            continue;
         settings.cmbPageSplit.setCurrentIndex(mode);
         fail(cleanCatalogOutput(files, output));
         files.clear();
@@ -148,8 +157,11 @@ int main(int argc, char *argv[])
 
         QElapsedTimer timer;
         timer.start();
-        if (mode == 1)
+        double copying = 0;
+        if (mode == 1) {
             fail(CollectCatImages(context, images, database));
+            copying = timer.nsecsElapsed() / 1e9;
+        }
         const Result<QString> first = CreateCatHTML(context, output + PagePrefixName, database, images);
         fail(first.status());
         fail(CreateCSS(context, output, true));
@@ -157,18 +169,24 @@ int main(int argc, char *argv[])
         measure.seconds = timer.nsecsElapsed() / 1e9;
         const long peakKb = peakMemoryKb();
 
-        const double floor = floorSeconds(output, measure.bytes);
+        const double oneFile = floorSeconds(output, measure.bytes, 1);
+        const double sameFiles = floorSeconds(output, measure.bytes, measure.files);
         const double megabytes = measure.bytes / 1e6;
         const long long pages = (items + 23) / 24;
-        std::printf("%-14s %8lld %9.2f %10.0f %8.1f %10.1f %9.1f %10.2f %8d %9.1f\n",
-                    mode == 0 ? "one file" : "file per page", pages, measure.seconds, pages / measure.seconds,
-                    megabytes, megabytes / measure.seconds, megabytes / floor, measure.seconds / floor,
+        std::printf("\n%s: %lld pages in %.2f s = %.0f pages/s; %lld files, %.1f MB = %.1f MB/s; "
+                    "%d picture headers read; peak memory %.1f MB\n",
+                    mode == 0 ? "One file" : "File per page", pages, measure.seconds, pages / measure.seconds,
+                    measure.files, megabytes, megabytes / measure.seconds,
                     static_cast<int>(files.distinctReadings.size()), peakKb / 1024.0);
+        std::printf("  floor, the same bytes in 1 file: %.3f s = %.0f MB/s (output %.1fx the floor)\n",
+                    oneFile, megabytes / oneFile, measure.seconds / oneFile);
+        std::printf("  floor, the same bytes in %lld files: %.3f s = %.0f MB/s (output %.1fx the floor)\n",
+                    measure.files, sameFiles, megabytes / sameFiles, measure.seconds / sameFiles);
         if (files.readings != static_cast<int>(files.distinctReadings.size()))
             std::printf("  %d picture headers were read more than once (%d readings)\n",
                         files.readings - static_cast<int>(files.distinctReadings.size()), files.readings);
         if (mode == 1)
-            std::printf("  %d pictures copied\n", files.copies);
+            std::printf("  %d pictures copied in %.2f s\n", files.copies, copying);
     }
     return 0;
 }

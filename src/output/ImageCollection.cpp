@@ -9,6 +9,7 @@
 #include "platform/FileSystem.h"
 #include "workdb/WorkDatabase.h"
 
+#include <QHash>
 #include <QSqlRecord>
 #include <QStringList>
 
@@ -63,12 +64,17 @@ Status CollectCatImages(RunContext &context, const QString &imagesFolder, const 
         return references.status();
     const auto total = static_cast<std::int64_t>(references->size());
     std::int64_t done = 0;
+    QHash<QString, std::optional<QString>> sources;
     for (const QString &reference : references.value()) {
         ++done;
         // References are looked up literally: "?" marks an item without a picture, and no
         // reference is a pattern that could match some other file.
         if (!reference.isEmpty() && reference != NoPicture) {
-            if (const auto source = context.files.findFile(reference)) {
+            // Items share pictures: each reference is looked up once.
+            auto known = sources.constFind(reference);
+            if (known == sources.cend())
+                known = sources.insert(reference, context.files.findFile(reference));
+            if (const std::optional<QString> &source = known.value()) {
                 // The copy takes the name the pages give it, so that they find it wherever
                 // file names are case-sensitive.
                 if (const Status copied = copier.copy(*source, ImageFileName(imagesFolder, reference));

@@ -272,6 +272,25 @@ private Q_SLOTS:
         QCOMPARE(readFile(own), QByteArray("own"));
     }
 
+    void theLocalCopyReplacesAndReports()
+    {
+        QTemporaryDir folder;
+        const QString source = folder.filePath(u"source.jpg"_qs);
+        const QString target = folder.filePath(u"target.jpg"_qs);
+        const QByteArray picture = QByteArray(200 * 1024, 'p') + "end"; // more than one block
+        writeFile(source, picture);
+        writeFile(target, QByteArray(500 * 1024, 'o'));
+        FileSystem &files = localFileSystem();
+        QVERIFY(files.copyFile(source, target).isOk());
+        QCOMPARE(readFile(target), picture);
+        const Status missing = files.copyFile(folder.filePath(u"none.jpg"_qs), target);
+        QVERIFY(!missing.isOk());
+        QVERIFY2(missing.description().contains(u"none.jpg"_qs), qPrintable(missing.description()));
+        const Status noFolder = files.copyFile(source, folder.filePath(u"no/such/folder/x.jpg"_qs));
+        QVERIFY(!noFolder.isOk());
+        QVERIFY(!QFileInfo::exists(folder.filePath(u"no/such/folder/x.jpg"_qs)));
+    }
+
     void aMissingWorkingDatabaseIsAFault()
     {
         Catalog catalog;
