@@ -4,6 +4,7 @@
 #include "control/CopiedPictures.h"
 #include "control/RunContext.h"
 #include "control/RunState.h"
+#include "platform/ForwardingFileSystem.h"
 #include "source/ConnectionParams.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
@@ -21,35 +22,20 @@ using namespace zorbin::test;
 
 namespace {
 
-// The file system of the tests, counting the copies it makes.
-class CountingFileSystem final : public FileSystem
+// The file system of the tests: the real one, failing the paths of `inner.failingPaths`, and
+// counting the copies it makes.
+class CountingFileSystem final : public ForwardingFileSystem
 {
 public:
-    bool fileExists(const QString &path) const override { return inner.fileExists(path); }
-    bool folderExists(const QString &path) const override { return inner.folderExists(path); }
-    std::optional<QString> findFile(const QString &path) const override { return inner.findFile(path); }
-    Status makeFolder(const QString &path) override { return inner.makeFolder(path); }
-    Status removeFile(const QString &path) override { return inner.removeFile(path); }
+    CountingFileSystem() : ForwardingFileSystem(inner) {}
+
     Status copyFile(const QString &from, const QString &to) override
     {
         copies << QFileInfo(to).fileName();
-        return inner.copyFile(from, to);
-    }
-    QStringList fileNames(const QString &folder) const override { return inner.fileNames(folder); }
-    Result<std::unique_ptr<QIODevice>> openForReading(const QString &path) const override
-    {
-        return inner.openForReading(path);
-    }
-    Result<std::unique_ptr<QIODevice>> openForWriting(const QString &path) override
-    {
-        return inner.openForWriting(path);
-    }
-    Result<std::unique_ptr<QIODevice>> openForAppending(const QString &path) override
-    {
-        return inner.openForAppending(path);
+        return ForwardingFileSystem::copyFile(from, to);
     }
 
-    // The target names of the copies, in order; failing paths as in FaultyFileSystem.
+    // The target names of the copies, in order.
     QStringList copies;
     FaultyFileSystem inner;
 };
