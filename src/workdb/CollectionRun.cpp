@@ -1,11 +1,95 @@
-// Stand-in until the collection steps are written.
 #include "workdb/CollectionRun.h"
 
-namespace zorbin {
+#include "control/CatalogSettings.h"
+#include "control/RunContext.h"
+#include "control/RunState.h"
+#include "control/UserPort.h"
+#include "workdb/CollectionLock.h"
+#include "workdb/CollectionSteps.h"
+#include "workdb/WorkDatabase.h"
+#include "workdb/WorkDatabasePath.h"
 
-Status BuildAndCollectData(RunContext &)
+namespace zorbin {
+namespace {
+
+// A price list or extra note that is to be collected while its list has no entry selected.
+Status nothingChosen(const QString &what)
 {
-    return Status::fault(QStringLiteral("איסוף הנתונים עדיין אינו זמין בגרסה זו."));
+    return Status::fault(QStringLiteral("סומן לאסוף %1, אך לא נבחר ברשימה איזה. "
+                                        "יש לבחור אותו בלשונית \"הגדרות נתונים\" או לבטל את הסימון.")
+                             .arg(what));
+}
+
+struct ChosenList
+{
+    CheckValue CatalogSettings::*use;
+    ChoiceList CatalogSettings::*list;
+    std::int16_t digit;
+    const char16_t *status;
+    const char16_t *name;
+};
+
+} // namespace
+
+Status BuildAndCollectData(RunContext &context)
+{
+    Result<std::unique_ptr<CollectionLock>> lock = CollectionLock::acquire(workDatabasePath());
+    if (!lock)
+        return lock.status();
+    RunState &state = context.state;
+    CatalogSettings &settings = context.settings;
+    state.CollectFailed = false;
+
+    context.user.showStatus(QStringLiteral("מאתחל בסיס נתונים זמני"));
+    state.WorkDBFile = CreateWorkDB(context);
+
+    context.user.showStatus(QStringLiteral("סורק את רשימת הפריטים"));
+    FillDBItem7(context, state.WorkDBFile);
+    if (state.CollectFailed)
+        return Status::ok();
+
+    context.user.showStatus(QStringLiteral("סורק קודי מיון"));
+    FillDBItemSort7(context, state.WorkDBFile);
+    if (state.CollectFailed)
+        return Status::ok();
+
+    static const ChosenList prices[] = {
+        {&CatalogSettings::chkUsePriceField, &CatalogSettings::cmbPriceField, 1, u"סורק מחירון ראשי",
+         u"מחירון ראשי"},
+        {&CatalogSettings::ChkUsePriceField2, &CatalogSettings::cmbPriceField2, 2, u"סורק מחירון משני",
+         u"מחירון משני"},
+    };
+    static const ChosenList notes[] = {
+        {&CatalogSettings::ChkUseExtraNote1, &CatalogSettings::cmbExtraNote1, 1, u"סורק נתון נוסף 1",
+         u"נתון נוסף 1"},
+        {&CatalogSettings::ChkUseExtraNote2, &CatalogSettings::cmbExtraNote2, 2, u"סורק נתון נוסף 2",
+         u"נתון נוסף 2"},
+    };
+    for (const ChosenList &price : prices) {
+        if (!isTicked(settings.*price.use))
+            continue;
+        context.user.showStatus(QString::fromUtf16(price.status));
+        const std::optional<std::int32_t> listId = (settings.*price.list).currentItemData();
+        if (!listId)
+            return nothingChosen(QString::fromUtf16(price.name));
+        FillDBItemPrice(context, state.WorkDBFile, price.digit, *listId);
+        if (state.CollectFailed)
+            return Status::ok();
+    }
+    for (const ChosenList &note : notes) {
+        if (!isTicked(settings.*note.use))
+            continue;
+        context.user.showStatus(QString::fromUtf16(note.status));
+        const std::optional<std::int32_t> noteId = (settings.*note.list).currentItemData();
+        if (!noteId)
+            return nothingChosen(QString::fromUtf16(note.name));
+        FillDBItemExtraNote(context, state.WorkDBFile, note.digit, *noteId);
+        if (state.CollectFailed)
+            return Status::ok();
+    }
+
+    context.user.showStatus(QStringLiteral("סריקת הנתונים הסתיימה"));
+    return Status::ok();
 }
 
 } // namespace zorbin

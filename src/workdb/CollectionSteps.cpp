@@ -1,0 +1,118 @@
+#include "workdb/CollectionSteps.h"
+
+#include "control/CatalogSettings.h"
+#include "control/RunContext.h"
+#include "platform/Paths.h"
+#include "workdb/CopyLoop.h"
+#include "workdb/SourceStatements.h"
+#include "workdb/WorkSchema.h"
+
+namespace zorbin {
+namespace {
+
+const QString MissingText = QStringLiteral("?");
+const QString Shekel = QStringLiteral("ש\"ח");
+
+CopiedColumn asRead(const char *target, const char *source)
+{
+    return {QLatin1String(target), QLatin1String(source), {}};
+}
+
+CopiedColumn textOr(const char *target, const char *source, const QString &defaultText)
+{
+    return {QLatin1String(target), QLatin1String(source),
+            [defaultText](const QVariant &value, const QString &) {
+                return QVariant(TextOrDefault(value, defaultText));
+            }};
+}
+
+CopiedColumn keyText()
+{
+    return {QStringLiteral("ItemKey"), QString(),
+            [](const QVariant &, const QString &key) { return QVariant(key); }};
+}
+
+// The picture reference of picture source 1: the folder, a separator unless it ends in one (an
+// empty folder included), the key and the extension, the two boxes read for every row.
+CopiedColumn pictureByKey(const CatalogSettings &settings)
+{
+    return {QStringLiteral("ItemPic"), QString(), [&settings](const QVariant &, const QString &key) {
+                QString folder = settings.txtPicPath;
+                if (!folder.endsWith(pathSeparator()))
+                    folder += pathSeparator();
+                return QVariant(folder + key + settings.txtPicExtension);
+            }};
+}
+
+} // namespace
+
+QString TextOrDefault(const QVariant &value, const QString &defaultText)
+{
+    return value.isNull() ? defaultText : value.toString();
+}
+
+void FillDBItem7(RunContext &context, const QString &pDBFile)
+{
+    const CatalogSettings &settings = context.settings;
+    Result<QString> statement = buildItemStatement(settings);
+    if (!statement)
+        return reportCollectFault(context, statement.status().description());
+    const bool pictureFromKey = settings.OptPicSource.selected() == PictureFromItemKey;
+    CopyPlan plan{statement.value(),
+                  QStringLiteral("tItems"),
+                  {keyText(),
+                   textOr("ItemName", "ItemDesc", MissingText),
+                   asRead("ItemSort", "SortGroup"),
+                   asRead("Filter", "Filter"),
+                   textOr("Unit", "SalesUnit", MissingText),
+                   pictureFromKey ? pictureByKey(settings) : textOr("ItemPic", "PicFile", MissingText),
+                   {QStringLiteral("Include"), QString(),
+                    [](const QVariant &, const QString &) { return QVariant(WorkTrue); }},
+                   asRead("SellPrice", "Price"),
+                   textOr("SellCoin", "Currency", MissingText)},
+                  true};
+    runCopyLoop(context, pDBFile, plan);
+}
+
+void FillDBItemPrice(RunContext &context, const QString &pDBFile, std::int16_t pPriceID,
+                     std::int32_t pPriceListID)
+{
+    Result<QString> statement = buildPriceStatement(context.settings, pPriceListID);
+    if (!statement)
+        return reportCollectFault(context, statement.status().description());
+    CopyPlan plan{statement.value(),
+                  QStringLiteral("tItemPrice") + QString::number(pPriceID),
+                  {keyText(), textOr("Coin", "CurrencyCode", Shekel), asRead("Price", "Price")},
+                  true};
+    runCopyLoop(context, pDBFile, plan);
+}
+
+void FillDBItemExtraNote(RunContext &context, const QString &pDBFile, std::int16_t pNoteFieldID,
+                         std::int32_t pExtraNoteID)
+{
+    Result<QString> statement = buildExtraNoteStatement(context.settings, pExtraNoteID);
+    if (!statement)
+        return reportCollectFault(context, statement.status().description());
+    CopyPlan plan{statement.value(),
+                  QStringLiteral("tExtraNote") + QString::number(pNoteFieldID),
+                  {keyText(), textOr("ExtraNote", "Note", MissingText)},
+                  true};
+    runCopyLoop(context, pDBFile, plan);
+}
+
+void FillDBItemSort7(RunContext &context, const QString &pDBFile)
+{
+    // A Null or empty name leaves SortName Null.
+    const CopiedColumn name{QStringLiteral("SortName"), QStringLiteral("SortCodeName"),
+                            [](const QVariant &value, const QString &) {
+                                const QString text = TextOrDefault(value, QString());
+                                return text.isEmpty() ? QVariant() : QVariant(text);
+                            }};
+    CopyPlan plan{buildSortGroupStatement(),
+                  QStringLiteral("tItemSort"),
+                  {asRead("ItemSort", "ItemSortCode"), name},
+                  false};
+    runCopyLoop(context, pDBFile, plan);
+}
+
+} // namespace zorbin
