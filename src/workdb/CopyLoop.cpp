@@ -5,22 +5,12 @@
 #include "control/RunState.h"
 #include "control/UserPort.h"
 #include "source/ConnectionString.h"
-#include "source/SourceConnection.h"
 #include "workdb/RowWriter.h"
-#include "workdb/SourceRowCount.h"
+#include "workdb/SourceReadAhead.h"
 #include "workdb/WorkDatabase.h"
-
-#include <QSqlError>
-#include <QSqlRecord>
 
 namespace zorbin {
 namespace {
-
-QString describeSourceError(const QSqlError &error)
-{
-    const QString text = error.text().trimmed();
-    return text.isEmpty() ? QStringLiteral("שגיאה לא ידועה בקריאה מבסיס הנתונים של הנהלת החשבונות.") : text;
-}
 
 // A refusal of the row's values names the row, so that the user knows which item to mend.
 QString describeRefusal(const WriteOutcome &refused, const CopyPlan &plan, const QVariant &key)
@@ -31,22 +21,28 @@ QString describeRefusal(const WriteOutcome &refused, const CopyPlan &plan, const
     return row.arg(key.toString()) + QStringLiteral(": ") + refused.description();
 }
 
-// The source columns of the plan by their position in the result; a fault names a missing one.
-Result<std::vector<int>> sourcePositions(const QSqlRecord &record, const CopyPlan &plan)
+// The source columns the plan reads, ItemKey first in the item loop, and for each target
+// column the position of its source among them (-1 for none).
+struct SourceColumns
 {
+    QStringList names;
     std::vector<int> positions;
+};
+
+SourceColumns sourceColumns(const CopyPlan &plan)
+{
+    SourceColumns columns;
+    if (plan.itemLoop)
+        columns.names << QStringLiteral("ItemKey");
     for (const CopiedColumn &column : plan.columns) {
-        int position = -1;
-        if (!column.source.isEmpty()) {
-            position = record.indexOf(column.source); // letter case aside, as the servers differ in it
-            if (position < 0)
-                return Status::fault(
-                    QStringLiteral("בתוצאת השאילתה על בסיס הנתונים של הנהלת החשבונות חסר השדה %1.")
-                        .arg(column.source));
+        if (column.source.isEmpty()) {
+            columns.positions.push_back(-1);
+        } else {
+            columns.positions.push_back(static_cast<int>(columns.names.size()));
+            columns.names << column.source;
         }
-        positions.push_back(position);
     }
-    return positions;
+    return columns;
 }
 
 QStringList targetColumns(const CopyPlan &plan)
@@ -67,36 +63,25 @@ void reportCollectFault(RunContext &context, const QString &description)
 
 void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan)
 {
-    Result<std::unique_ptr<SourceConnection>> source =
-        SourceConnection::open(BuildConnString(context.connection));
-    if (!source)
-        return reportCollectFault(context, source.status().description());
-    const std::int64_t total = plan.itemLoop ? countSourceRows(*source.value(), plan.statement) : 0;
-    Result<QSqlQuery> rows = source.value()->select(plan.statement);
-    if (!rows)
-        return reportCollectFault(context, rows.status().description());
-    if (!rows->next()) {
-        if (rows->lastError().isValid())
-            reportCollectFault(context, describeSourceError(rows->lastError()));
+    const SourceColumns columns = sourceColumns(plan);
+    SourceReadAhead source(BuildConnString(context.connection), plan.statement, columns.names, plan.itemLoop);
+    if (Status running = source.waitUntilRunning(); !running)
+        return reportCollectFault(context, running.description());
+    if (!source.next()) {
+        if (Status read = source.readFailure(); !read)
+            reportCollectFault(context, read.description());
         return; // no rows: the working database is not opened
     }
 
     ProgressMeter meter(context.user, context.state);
+    const std::int64_t total = source.total();
     if (plan.itemLoop)
         meter.reset();
-    const QSqlRecord record = rows->record();
-    const int keyPosition = plan.itemLoop ? record.indexOf(QStringLiteral("ItemKey")) : -1;
-    Result<std::vector<int>> positions = sourcePositions(record, plan);
-    if (!positions)
-        return reportCollectFault(context, positions.status().description());
-    if (plan.itemLoop && keyPosition < 0)
-        return reportCollectFault(
-            context, QStringLiteral("בתוצאת השאילתה על בסיס הנתונים של הנהלת החשבונות חסר השדה ItemKey."));
-
     Result<std::unique_ptr<WorkDatabase>> work = WorkDatabase::open(pDBFile);
     if (!work)
         return reportCollectFault(context, work.status().description());
     WorkDatabase &target = *work.value();
+    // One transaction for the step, committed however the step ends: what was written stays.
     if (Status begun = target.begin(); !begun)
         return reportCollectFault(context, begun.description());
     RowWriter writer(target, plan.table, targetColumns(plan));
@@ -104,16 +89,17 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
         return reportCollectFault(context, writer.prepareError());
 
     std::vector<QVariant> values(plan.columns.size());
+    const QVariant none;
     std::int64_t counter = 0;
     bool stopped = false;
     do {
-        const QString key = plan.itemLoop ? rows->value(keyPosition).toString() : QString();
+        const std::span<const QVariant> read = source.row();
+        const QString key = plan.itemLoop ? read[0].toString() : QString();
         if (!plan.itemLoop || !key.isEmpty()) {
             for (std::size_t i = 0; i < plan.columns.size(); ++i) {
-                const CopiedColumn &column = plan.columns[i];
-                const int position = positions.value()[i];
-                const QVariant read = position >= 0 ? rows->value(position) : QVariant();
-                values[i] = column.convert ? column.convert(read, key) : read;
+                const int position = columns.positions[i];
+                const QVariant &value = position >= 0 ? read[static_cast<std::size_t>(position)] : none;
+                values[i] = plan.columns[i].convert ? plan.columns[i].convert(value, key) : value;
             }
             if (const WriteOutcome written = writer.write(values); !written && !written.isDuplicateKey()) {
                 (void)target.commit();
@@ -124,12 +110,12 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
             stopped = true;
             break;
         }
-    } while (rows->next());
+    } while (source.next());
 
     if (Status committed = target.commit(); !committed)
         return reportCollectFault(context, committed.description());
-    if (!stopped && rows->lastError().isValid())
-        return reportCollectFault(context, describeSourceError(rows->lastError()));
+    if (Status read = source.readFailure(); !stopped && !read)
+        return reportCollectFault(context, read.description());
     if (plan.itemLoop)
         meter.reset();
 }

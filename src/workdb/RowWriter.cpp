@@ -9,7 +9,8 @@
 namespace zorbin {
 namespace {
 
-int bindValue(sqlite3_stmt *statement, int position, const QVariant &value)
+// Binds one value; a text is bound as UTF-8 from `text`, which must live until the step.
+int bindValue(sqlite3_stmt *statement, int position, const QVariant &value, QByteArray &text)
 {
     if (value.isNull())
         return sqlite3_bind_null(statement, position);
@@ -34,23 +35,23 @@ int bindValue(sqlite3_stmt *statement, int position, const QVariant &value)
     case QMetaType::Double:
     case QMetaType::Float:
         return sqlite3_bind_double(statement, position, value.toDouble());
-    case QMetaType::QString: {
-        const QString &text = *static_cast<const QString *>(value.constData());
-        return sqlite3_bind_text16(statement, position, text.utf16(), static_cast<int>(text.size() * 2),
-                                   SQLITE_TRANSIENT);
+    case QMetaType::QString:
+        text = static_cast<const QString *>(value.constData())->toUtf8();
+        break;
+    default:
+        text = value.toString().toUtf8();
+        break;
     }
-    default: {
-        const QString text = value.toString();
-        return sqlite3_bind_text16(statement, position, text.utf16(), static_cast<int>(text.size() * 2),
-                                   SQLITE_TRANSIENT);
-    }
-    }
+    // SQLite keeps text as UTF-8: converting here, in one pass, is cheaper than letting it convert.
+    return sqlite3_bind_text(statement, position, text.constData(), static_cast<int>(text.size()),
+                             SQLITE_STATIC);
 }
 
 } // namespace
 
 RowWriter::RowWriter(WorkDatabase &database, const QString &table, const QStringList &columns)
-    : m_handle(database.handle()), m_columnCount(static_cast<int>(columns.size()))
+    : m_handle(database.handle()), m_columnCount(static_cast<int>(columns.size())),
+      m_texts(static_cast<std::size_t>(m_columnCount))
 {
     QStringList marks;
     for (int i = 0; i < m_columnCount; ++i)
@@ -77,7 +78,8 @@ WriteOutcome RowWriter::write(std::span<const QVariant> values)
         return WriteOutcome::refused(Refusal::Other, m_prepareError);
     Q_ASSERT(values.size() == static_cast<std::size_t>(m_columnCount));
     for (int i = 0; i < m_columnCount; ++i) {
-        if (bindValue(m_statement, i + 1, values[static_cast<std::size_t>(i)]) != SQLITE_OK)
+        const auto at = static_cast<std::size_t>(i);
+        if (bindValue(m_statement, i + 1, values[at], m_texts[at]) != SQLITE_OK)
             return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
                                             QString::fromUtf8(sqlite3_errmsg(m_handle)));
     }
@@ -87,6 +89,7 @@ WriteOutcome RowWriter::write(std::span<const QVariant> values)
         outcome = WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
                                            QString::fromUtf8(sqlite3_errmsg(m_handle)));
     sqlite3_reset(m_statement);
+    sqlite3_clear_bindings(m_statement); // before the texts they point into change
     return outcome;
 }
 

@@ -5,6 +5,7 @@
 #include <QStringList>
 #include <QVariant>
 #include <span>
+#include <vector>
 
 struct sqlite3;
 struct sqlite3_stmt;
@@ -39,6 +40,7 @@ private:
     sqlite3 *m_handle = nullptr;
     sqlite3_stmt *m_statement = nullptr;
     int m_columnCount = 0;
+    std::vector<QByteArray> m_texts; // the UTF-8 texts bound to the statement, one per column
     QString m_prepareError;
 };
 

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "control/UserPort.h"
+
+#include <QElapsedTimer>
+#include <QStringList>
+#include <vector>
+
+namespace zorbin::bench {
+
+// A UserPort for timing a collection run: every status text starts a new step, whose length
+// runs to the next text (the last to finish()). Messages go to standard error; yields let
+// Qt handle its events, as the desktop program does.
+class StepClock final : public UserPort
+{
+public:
+    struct Step
+    {
+        QString text;
+        double seconds = 0;
+    };
+
+    void start();
+    void finish();
+    const std::vector<Step> &steps() const { return m_steps; }
+    int messageCount() const { return m_messages; }
+
+    Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
+    void tell(const QString &text, const QString &title, MessageIcon icon) override;
+    void showStatus(const QString &text) override;
+    int progressFrameWidth() const override { return 1000; }
+    int progressFillWidth() const override { return m_fill; }
+    void setProgressFillWidth(int width) override { m_fill = width; }
+    void yield() override;
+    Status openBrowser(const QString &) override { return Status::ok(); }
+
+private:
+    void closeStep();
+
+    QElapsedTimer m_clock;
+    qint64 m_stepStart = 0;
+    std::vector<Step> m_steps;
+    int m_fill = 0;
+    int m_messages = 0;
+};
+
+} // namespace zorbin::bench

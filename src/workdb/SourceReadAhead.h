@@ -1,0 +1,79 @@
+#pragma once
+
+#include "common/Status.h"
+
+#include <QString>
+#include <QStringList>
+#include <QVariant>
+#include <condition_variable>
+#include <cstdint>
+#include <deque>
+#include <mutex>
+#include <span>
+#include <thread>
+#include <vector>
+
+namespace zorbin {
+
+// Reads one statement's rows from the accounting database on a thread of its own, ahead of the
+// collection step that writes them, so that reading the source and writing the working
+// database overlap on two processor cores. The step still sees the rows one by one, in the
+// source's order, and everything it does with them (writing, progress, stop, messages) stays
+// on its own thread. The connection is opened, used and closed on the reading thread.
+//
+// At most a few thousand rows are held ahead; the reading thread is stopped and joined when the
+// object is destroyed, whether or not every row was taken.
+class SourceReadAhead
+{
+public:
+    // Starts reading: opens a connection from `connectionString`, counts the statement's rows
+    // first when `countRows` is set (see countSourceRows), runs the statement, and reads the
+    // `columns` (by name, letter case aside) of every row.
+    SourceReadAhead(QString connectionString, QString statement, QStringList columns, bool countRows);
+    ~SourceReadAhead();
+
+    SourceReadAhead(const SourceReadAhead &) = delete;
+    SourceReadAhead &operator=(const SourceReadAhead &) = delete;
+
+    // Waits until the statement has run: a fault when the connection or the statement was
+    // refused or a column is missing from its result.
+    Status waitUntilRunning();
+    // The number of rows counted (0 when not asked or not countable). After waitUntilRunning().
+    std::int64_t total() const { return m_total; }
+
+    // Moves to the next row; false at the end of the rows or when reading failed.
+    bool next();
+    // The current row's values, in the order of `columns`; a Null is a null QVariant.
+    std::span<const QVariant> row() const;
+    // Why reading ended before the last row; ok when it reached the end.
+    Status readFailure();
+
+private:
+    void read();
+    void refuse(Status failure);
+    void publish(std::vector<QVariant> &batch, bool last, Status failure);
+
+    const QString m_connectionString;
+    const QString m_statement;
+    const QStringList m_columns;
+    const bool m_countRows;
+    const std::size_t m_width;
+
+    std::mutex m_mutex;
+    std::condition_variable m_changed;
+    bool m_running = false;   // the statement has run (or failed to)
+    bool m_finished = false;  // no more batches will come
+    bool m_cancelled = false; // the step no longer wants rows
+    Status m_refusal;         // why the statement did not run
+    Status m_failure;         // why reading ended early
+    std::deque<std::vector<QVariant>> m_batches;
+    std::int64_t m_total = 0;
+
+    std::vector<QVariant> m_current; // the batch the step is reading
+    std::size_t m_position = 0;      // of the current row in m_current, in values
+    bool m_started = false;
+
+    std::thread m_thread;
+};
+
+} // namespace zorbin
