@@ -81,14 +81,29 @@ QString oleDbConnValue(const QString &value)
     return QLatin1Char('"') + escaped + QLatin1Char('"');
 }
 
+namespace {
+
+// The SQL Server ODBC form, with `login` (";uid=U;pwd=P" or ";Trusted_Connection=yes") between
+// the server and the database.
+QString sqlServerOdbc(const QString &server, const QString &login, const QString &database)
+{
+    return QStringLiteral("driver={SQL Server};server=") + odbcConnValue(server) + login +
+           QStringLiteral(";database=") + odbcConnValue(database);
+}
+
+QString odbcLogin(const QString &user, const QString &password)
+{
+    return QStringLiteral(";uid=") + odbcConnValue(user) + QStringLiteral(";pwd=") + odbcConnValue(password);
+}
+
+} // namespace
+
 QString BuildConnString(const QString &server, const QString &user, const QString &password,
                         const QString &database, std::int16_t type)
 {
     switch (type) {
     case OdbcConnection:
-        return QStringLiteral("driver={SQL Server};server=") + odbcConnValue(server) +
-               QStringLiteral(";uid=") + odbcConnValue(user) + QStringLiteral(";pwd=") +
-               odbcConnValue(password) + QStringLiteral(";database=") + odbcConnValue(database);
+        return sqlServerOdbc(server, odbcLogin(user, password), database);
     case OleDbConnection:
         if (user.isEmpty())
             return QStringLiteral("Provider=sqloledb;Data Source=") + oleDbConnValue(server) +
@@ -149,15 +164,11 @@ QString odbcConnStringForOleDb(const QString &oleDb)
     const bool integrated = security.compare(QLatin1String("SSPI"), Qt::CaseInsensitive) == 0 ||
                             security.compare(QLatin1String("true"), Qt::CaseInsensitive) == 0 ||
                             security.compare(QLatin1String("yes"), Qt::CaseInsensitive) == 0;
-    const QString server = odbcConnValue(connStringValue(oleDb, QStringLiteral("Data Source")));
-    const QString database = odbcConnValue(connStringValue(oleDb, QStringLiteral("Initial Catalog")));
-    if (integrated)
-        return QStringLiteral("driver={SQL Server};server=") + server +
-               QStringLiteral(";Trusted_Connection=yes") + QStringLiteral(";database=") + database;
-    return QStringLiteral("driver={SQL Server};server=") + server + QStringLiteral(";uid=") +
-           odbcConnValue(connStringValue(oleDb, QStringLiteral("User Id"))) + QStringLiteral(";pwd=") +
-           odbcConnValue(connStringValue(oleDb, QStringLiteral("Password"))) + QStringLiteral(";database=") +
-           database;
+    const QString login = integrated ? QStringLiteral(";Trusted_Connection=yes")
+                                     : odbcLogin(connStringValue(oleDb, QStringLiteral("User Id")),
+                                                 connStringValue(oleDb, QStringLiteral("Password")));
+    return sqlServerOdbc(connStringValue(oleDb, QStringLiteral("Data Source")), login,
+                         connStringValue(oleDb, QStringLiteral("Initial Catalog")));
 }
 
 QString connStringValue(const QString &connectionString, const QString &key)

@@ -9,6 +9,7 @@
 #include "testutil/TestMain.h"
 
 #include <QFile>
+#include <QFileInfo>
 #include <QTemporaryDir>
 #include <QTest>
 
@@ -173,10 +174,7 @@ private Q_SLOTS:
     void startUpFillsTheListsBeforeTheSettings()
     {
         QTemporaryDir folder;
-        const QString settingsFile = folder.filePath(QStringLiteral("settings.ini"));
-        QVERIFY(QFile::copy(demoSettingsPath(), settingsFile));
-        QVERIFY(QFile::setPermissions(settingsFile, QFileDevice::ReadOwner | QFileDevice::WriteOwner));
-        auto store = openIniSettingsStore(settingsFile);
+        auto store = copyDemoSettings(folder.path());
         RecordingUserPort user;
         CatalogControl control(user, *store, localFileSystem());
         control.UserControl_Initialize();
@@ -192,15 +190,29 @@ private Q_SLOTS:
         QVERIFY(control.persistence().unappliedKeys().isEmpty());
         QVERIFY(user.messages.isEmpty());
         QVERIFY(user.questions.isEmpty());
+
+        // The rest of the demo's settings read back as the script wrote them: a picture, the
+        // name, the key and a price in each cell, a file per page, pictures of at most 120 x 120.
+        QCOMPARE(settings.lines[0].tag, QStringLiteral("0"));
+        QCOMPARE(settings.lines[1].tag, QStringLiteral("2"));
+        QCOMPARE(settings.lines[2].tag, QStringLiteral("1"));
+        QCOMPARE(settings.lines[2].caption, QStringLiteral("פריט: "));
+        QCOMPARE(settings.lines[3].tag, QStringLiteral("4"));
+        QCOMPARE(settings.lines[4].tag, QString());
+        QCOMPARE(settings.lines[1].format.weight, std::uint8_t(1));
+        QCOMPARE(settings.chkUsePriceField, CheckValue::Checked);
+        QCOMPARE(settings.cmbPageSplit.currentIndex(), 1);
+        QCOMPARE(settings.OptPicSource.selected(), int(PictureFromFileField));
+        QCOMPARE(settings.txtImageH, QStringLiteral("120"));
+        QCOMPARE(settings.txtImageW, QStringLiteral("120"));
+        QCOMPARE(settings.txtTopTitle2, QStringLiteral("בית וגן בע\"מ"));
+        QVERIFY(QFileInfo(settings.txtLogo).isFile());
     }
 
     void startUpWithoutTheDatabaseSaysNothing()
     {
         QTemporaryDir folder;
-        const QString settingsFile = folder.filePath(QStringLiteral("settings.ini"));
-        QVERIFY(QFile::copy(demoSettingsPath(), settingsFile));
-        QVERIFY(QFile::setPermissions(settingsFile, QFileDevice::ReadOwner | QFileDevice::WriteOwner));
-        auto store = openIniSettingsStore(settingsFile);
+        auto store = copyDemoSettings(folder.path());
         store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnServer"),
                      folder.path());
         RecordingUserPort user;

@@ -1,5 +1,6 @@
 #include "testutil/AccountingFixture.h"
 
+#include "platform/SettingsStore.h"
 #include "testutil/TestFiles.h"
 
 #include <QDir>
@@ -82,6 +83,18 @@ Status makeAccountingFile(const QString &path, const QStringList &statements)
     }
     QSqlDatabase::removeDatabase(name);
     return status;
+}
+
+std::unique_ptr<SettingsStore> copyDemoSettings(const QString &folder)
+{
+    const QString copy = QDir(folder).filePath(QStringLiteral("demo-settings.ini"));
+    QFile::remove(copy);
+    if (!QFile::copy(demoSettingsPath(), copy))
+        QTest::qFail(
+            qPrintable(QStringLiteral("cannot copy %1 (is the project built?)").arg(demoSettingsPath())),
+            __FILE__, __LINE__);
+    QFile::setPermissions(copy, QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+    return openIniSettingsStore(copy);
 }
 
 ConnectionParams fileConnection(const QString &path)
