@@ -133,7 +133,7 @@ INSERT INTO Items SELECT k,
  CASE WHEN i % 37 = 0 THEN NULL ELSE CASE i % 5 WHEN 0 THEN 'יח''' WHEN 1 THEN 'ק"ג' WHEN 2 THEN 'מטר' WHEN 3 THEN 'זוג' ELSE 'סט' END END,
  CASE WHEN i % 41 = 0 THEN NULL ELSE round(9.9 + (i * 37) % 1000 + (i % 4) * 0.25, 2) END,
  CASE WHEN i % 43 = 0 THEN NULL WHEN i % 9 = 0 THEN '\$' ELSE 'ש"ח' END,
- CASE WHEN i % 5 = 0 THEN NULL WHEN i % 47 = 0 THEN $pictures_ref || 'missing-' || i || '.jpg'
+ CASE WHEN i % 5 = 4 THEN NULL WHEN i % 47 = 0 THEN $pictures_ref || 'missing-' || i || '.jpg'
       ELSE $pictures_ref || p.File END
  FROM Demo
  JOIN Words w ON w.n = i % 20 JOIN Kinds d ON d.n = i / 20 % 10 JOIN Pictures p ON p.n = i % 12;
@@ -208,7 +208,7 @@ CutOff5=*
 UseItemKey=0
 FromItem=
 ToItem=
-SortBy=1
+SortBy=0
 SortDir=0
 PicSource0=True
 PicSource1=False

@@ -112,25 +112,43 @@ int finish(const RunOutcome &outcome, const RunState &state)
     return Failure;
 }
 
-// The catalog or list run on the given store.
-int runOutput(bool catalog, SettingsStore &store, const QCommandLineParser &parser,
-              const std::function<void(CatalogSettings &)> &adjust = {})
+// What a catalog or list command asks for.
+struct RunRequest
 {
-    std::unique_ptr<Browser> browser = parser.isSet(OpenOption) ? makeSystemBrowser() : nullptr;
+    bool catalog = true;
+    bool useMarked = false;
+    bool onlyWithPicture = false;
+    bool open = false;
+    QString outputFolder; // empty: the settings' own
+};
+
+RunRequest requestOf(bool catalog, const QCommandLineParser &parser)
+{
+    return {catalog,
+            parser.isSet(UseMarkedOption),
+            parser.isSet(OnlyWithPictureOption),
+            parser.isSet(OpenOption),
+            {}};
+}
+
+// The catalog or list run on the given store.
+int runOutput(SettingsStore &store, const RunRequest &request)
+{
+    std::unique_ptr<Browser> browser = request.open ? makeSystemBrowser() : nullptr;
     CliUserPort user(browser.get());
     CatalogControl control(user, store, localFileSystem());
     control.UserControl_Initialize();
     CatalogSettings &settings = control.settings();
-    if (parser.isSet(UseMarkedOption)) {
+    if (request.useMarked) {
         settings.ChkSelectAccount = CheckValue::Checked;
         control.runState().WorkDBFile = lastWorkDatabase();
     }
-    if (parser.isSet(OnlyWithPictureOption))
+    if (request.onlyWithPicture)
         settings.ChkOnlyWithPic = CheckValue::Checked;
-    if (adjust)
-        adjust(settings);
+    if (!request.outputFolder.isEmpty())
+        settings.txtPagingPath = request.outputFolder;
     const RunOutcome outcome =
-        catalog ? control.produceCatalog() : control.produceList(!parser.isSet(UseMarkedOption));
+        request.catalog ? control.produceCatalog() : control.produceList(!request.useMarked);
     return finish(outcome, control.runState());
 }
 
@@ -146,7 +164,7 @@ int catalogOrList(bool catalog, const QStringList &arguments)
     if (const auto exit = checkSettingsFile(parser))
         return *exit;
     auto store = openStore(parser);
-    return runOutput(catalog, *store, parser);
+    return runOutput(*store, requestOf(catalog, parser));
 }
 
 int demo(const QStringList &arguments)
@@ -171,9 +189,10 @@ int demo(const QStringList &arguments)
         return Failure;
     }
     auto store = openIniSettingsStore(files->settingsFile);
-    return runOutput(true, *store, parser, [&folder](CatalogSettings &settings) {
-        settings.txtPagingPath = QDir::toNativeSeparators(folder);
-    });
+    RunRequest request;
+    request.open = parser.isSet(OpenOption);
+    request.outputFolder = QDir::toNativeSeparators(folder);
+    return runOutput(*store, request);
 }
 
 int sql(const QStringList &arguments)
