@@ -1,5 +1,8 @@
+#include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
 
+#include <QDir>
+#include <QFileInfo>
 #include <QProcess>
 #include <QTemporaryDir>
 #include <QTest>
@@ -21,7 +24,7 @@ Run runCli(const QStringList &arguments, const QString &folder = {})
     if (!folder.isEmpty())
         process.setWorkingDirectory(folder);
     process.start();
-    process.closeWriteChannel();  // it must never wait for input
+    process.closeWriteChannel(); // it must never wait for input
     if (!process.waitForFinished(120000))
         return {};
     return {process.exitCode(), QString::fromUtf8(process.readAllStandardOutput()),
@@ -60,8 +63,8 @@ private Q_SLOTS:
         QTest::newRow("unknown command") << QStringList{QStringLiteral("print")};
         QTest::newRow("unknown option") << QStringList{QStringLiteral("catalog"), QStringLiteral("--colour")};
         QTest::newRow("stray argument") << QStringList{QStringLiteral("list"), QStringLiteral("now")};
-        QTest::newRow("missing settings file")
-            << QStringList{QStringLiteral("catalog"), QStringLiteral("--settings"), QStringLiteral("/no/such.ini")};
+        QTest::newRow("missing settings file") << QStringList{
+            QStringLiteral("catalog"), QStringLiteral("--settings"), QStringLiteral("/no/such.ini")};
     }
     void wrongCommandLinesAreUsageErrors()
     {
@@ -77,13 +80,59 @@ private Q_SLOTS:
         const QString settings = folder.filePath(QStringLiteral("settings.ini"));
         QFile file(settings);
         QVERIFY(file.open(QIODevice::WriteOnly));
-        file.write(QStringLiteral("[Params]\nConnType=2\nConnServer=%1\nConnDataBase=missing.db\nPagingPath=%1/out\n")
+        file.write(QStringLiteral(
+                       "[Params]\nConnType=2\nConnServer=%1\nConnDataBase=missing.db\nPagingPath=%1/out\n")
                        .arg(folder.path())
                        .toUtf8());
         file.close();
-        const Run run = runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        const Run run =
+            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
         QCOMPARE(run.exitCode, 1);
+        QVERIFY2(run.err.contains(QStringLiteral("missing.db")), qPrintable(run.err));
         QVERIFY2(run.err.contains(QStringLiteral("תקלה")), qPrintable(run.err));
+    }
+
+    void demoWritesTheCatalog()
+    {
+        QTemporaryDir folder;
+        QVERIFY(folder.isValid());
+        const Run run =
+            runCli({QStringLiteral("demo"), QStringLiteral("--out"), QStringLiteral("shop")}, folder.path());
+        QCOMPARE(run.exitCode, 0);
+        const QString first = folder.filePath(QStringLiteral("shop/zoindex.htm"));
+        QCOMPARE(run.out.trimmed(), first);
+        QVERIFY(QFileInfo::exists(first));
+        QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/zo000002.htm"))));
+        QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/tarnik.css"))));
+        QVERIFY(!QDir(folder.filePath(QStringLiteral("shop/images"))).isEmpty());
+    }
+
+    // Each enabled step prints its statement once, in the order of a run; the password never shows.
+    void sqlListsTheStatementsOfARun()
+    {
+        QTemporaryDir folder;
+        QVERIFY(folder.isValid());
+        const QString settings = folder.filePath(QStringLiteral("settings.ini"));
+        const QByteArray common = "[Params]\nConnType=0\nConnServer=db1\nConnUID=shop\nConnPWD=s3cret\n"
+                                  "ConnDataBase=stock\nUseCatCode=1\nFromSort=10\nLineTag0=0\nLineTag1=8\n";
+        zorbin::test::writeFile(settings, common + "UseExtraNote2=1\n");
+        const Run run = runCli({QStringLiteral("sql"), QStringLiteral("--settings"), settings});
+        QCOMPARE(run.exitCode, 1); // the note kinds could not be read, so no note is chosen
+        QVERIFY2(run.err.contains(QStringLiteral("נתון נוסף 2")), qPrintable(run.err));
+
+        zorbin::test::writeFile(settings, common);
+        const Run listed = runCli({QStringLiteral("sql"), QStringLiteral("--settings"), settings});
+        QCOMPARE(listed.exitCode, 0);
+        QStringList labels;
+        for (const QString &line : listed.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts))
+            labels << line.section(QLatin1Char(':'), 0, 0);
+        QCOMPARE(labels, (QStringList{QStringLiteral("connection"), QStringLiteral("items"),
+                                      QStringLiteral("sort-groups"), QStringLiteral("catalog")}));
+        QVERIFY(
+            listed.out.contains(QStringLiteral("connection: driver={SQL Server};server=db1;uid=shop;pwd=")));
+        QVERIFY(!listed.out.contains(QStringLiteral("s3cret")));
+        QVERIFY(listed.out.contains(QStringLiteral(" And Items.SortGroup >= 10")));
+        QVERIFY(listed.out.contains(QStringLiteral("(Select ExtraNote From tExtraNote2")));
     }
 };
 
