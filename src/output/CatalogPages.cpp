@@ -35,7 +35,7 @@ public:
         if (m_rows.count() == 0)
             return QString();
         if (const Status status = writePages(); !status) {
-            abandon();
+            (void)abandon(); // the first failure is the one to report
             return status;
         }
         m_meter.reset();
@@ -62,10 +62,8 @@ private:
             auto stop = writeGrid();
             if (!stop)
                 return stop.status();
-            if (stop.value() == Stop::Requested) {
-                abandon();
-                return Status::ok();
-            }
+            if (stop.value() == Stop::Requested)
+                return abandon();
             if (m_layout.bottomPercent > 0)
                 writeBottomBand(*m_file, m_layout, m_prefix, page, m_pageCount);
             writeOuterTableEnd(*m_file);
@@ -134,18 +132,19 @@ private:
 
     // Ends the open page where it stands: closes its grid row, its outer table and the
     // document, so that the file is a whole page.
-    void abandon()
+    Status abandon()
     {
         if (!m_file)
-            return;
+            return Status::ok();
         if (m_rowOpen)
             m_file->writeLine(u"  </tr>");
         if (m_tableOpen)
             writeOuterTableEnd(*m_file);
         writeDocumentEnd(*m_file);
-        (void)m_file->close();
+        const Status closed = m_file->close();
         m_file.reset();
         m_rowOpen = m_tableOpen = false;
+        return closed;
     }
 
     RunContext &m_context;
