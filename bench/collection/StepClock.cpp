@@ -9,6 +9,8 @@ void StepClock::start()
 {
     m_steps.clear();
     m_messages = 0;
+    m_yields = 0;
+    m_yieldNanoseconds = 0;
     m_clock.start();
     m_stepStart = m_clock.nsecsElapsed();
 }
@@ -40,7 +42,10 @@ void StepClock::showStatus(const QString &text)
 
 void StepClock::yield()
 {
+    const qint64 before = m_clock.nsecsElapsed();
     QCoreApplication::processEvents();
+    ++m_yields;
+    m_yieldNanoseconds += m_clock.nsecsElapsed() - before;
 }
 
 } // namespace zorbin::bench

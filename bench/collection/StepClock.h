@@ -24,6 +24,9 @@ public:
     void finish();
     const std::vector<Step> &steps() const { return m_steps; }
     int messageCount() const { return m_messages; }
+    // The progress points and the time spent at them letting Qt handle its events.
+    int yields() const { return m_yields; }
+    double yieldSeconds() const { return static_cast<double>(m_yieldNanoseconds) / 1e9; }
 
     Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
     void tell(const QString &text, const QString &title, MessageIcon icon) override;
@@ -42,6 +45,8 @@ private:
     std::vector<Step> m_steps;
     int m_fill = 0;
     int m_messages = 0;
+    int m_yields = 0;
+    qint64 m_yieldNanoseconds = 0;
 };
 
 } // namespace zorbin::bench

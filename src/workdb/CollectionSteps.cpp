@@ -36,12 +36,14 @@ CopiedColumn keyText()
 // empty folder included), the key and the extension, the two boxes read for every row.
 CopiedColumn pictureByKey(const CatalogSettings &settings)
 {
-    return {QStringLiteral("ItemPic"), QString(), [&settings](const QVariant &, const QString &key) {
+    return {QStringLiteral("ItemPic"), QString(),
+            [&settings](const QVariant &, const QString &key) {
                 QString folder = settings.txtPicPath;
                 if (!folder.endsWith(pathSeparator()))
                     folder += pathSeparator();
                 return QVariant(folder + key + settings.txtPicExtension);
-            }};
+            },
+            true};
 }
 
 } // namespace

@@ -9,16 +9,19 @@
 #include "workdb/SourceReadAhead.h"
 #include "workdb/WorkDatabase.h"
 
+#include <algorithm>
+#include <iterator>
+
 namespace zorbin {
 namespace {
 
 // A refusal of the row's values names the row, so that the user knows which item to mend.
-QString describeRefusal(const WriteOutcome &refused, const CopyPlan &plan, const QVariant &key)
+QString describeRefusal(const WriteOutcome &refused, const CopyPlan &plan, const WorkValue &key)
 {
     if (refused.refusal() != Refusal::TooLong && refused.refusal() != Refusal::WrongKind)
         return refused.description();
     const QString row = plan.itemLoop ? QStringLiteral("פריט %1") : QStringLiteral("קוד מיון %1");
-    return row.arg(key.toString()) + QStringLiteral(": ") + refused.description();
+    return row.arg(key.toText()) + QStringLiteral(": ") + refused.description();
 }
 
 // The source columns the plan reads, ItemKey first in the item loop, and for each target
@@ -45,6 +48,36 @@ SourceColumns sourceColumns(const CopyPlan &plan)
     return columns;
 }
 
+// Makes a target row from a source row on the reading thread. In the item loop a row whose key
+// reads as the empty text is passed over: it is marked by a Null first value (ItemKey).
+SourceReadAhead::Shaper shaperFor(const CopyPlan &plan, const SourceColumns &columns)
+{
+    return [&plan, &columns](std::span<const QVariant> read, std::span<WorkValue> row) {
+        const QString key = plan.itemLoop ? read[0].toString() : QString();
+        if (plan.itemLoop && key.isEmpty())
+            return;
+        static const QVariant none;
+        for (std::size_t i = 0; i < plan.columns.size(); ++i) {
+            const CopiedColumn &column = plan.columns[i];
+            if (column.readsSettings)
+                continue;
+            const int position = columns.positions[i];
+            const QVariant &value = position >= 0 ? read[static_cast<std::size_t>(position)] : none;
+            row[i] = WorkValue::from(column.convert ? column.convert(value, key) : value);
+        }
+    };
+}
+
+// The columns whose conversion reads the settings, made on the step's thread.
+void completeOnStepThread(const CopyPlan &plan, std::span<WorkValue> row)
+{
+    const QString key = row[0].toText();
+    for (std::size_t i = 0; i < plan.columns.size(); ++i) {
+        if (plan.columns[i].readsSettings)
+            row[i] = WorkValue::from(plan.columns[i].convert(QVariant(), key));
+    }
+}
+
 QStringList targetColumns(const CopyPlan &plan)
 {
     QStringList names;
@@ -64,7 +97,9 @@ void reportCollectFault(RunContext &context, const QString &description)
 void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan)
 {
     const SourceColumns columns = sourceColumns(plan);
-    SourceReadAhead source(BuildConnString(context.connection), plan.statement, columns.names, plan.itemLoop);
+    const SourceReadAhead::Shaper shaper = shaperFor(plan, columns);
+    SourceReadAhead source(BuildConnString(context.connection), plan.statement, columns.names, plan.itemLoop,
+                           plan.columns.size(), shaper);
     if (Status running = source.waitUntilRunning(); !running)
         return reportCollectFault(context, running.description());
     if (!source.next()) {
@@ -88,29 +123,46 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
     if (!writer.prepareError().isEmpty())
         return reportCollectFault(context, writer.prepareError());
 
-    std::vector<QVariant> values(plan.columns.size());
-    const QVariant none;
+    const bool readsSettings = std::any_of(plan.columns.begin(), plan.columns.end(),
+                                           [](const CopiedColumn &c) { return c.readsSettings; });
+    static_assert(RowWriter::MaxRowsAtOnce >= ProgressMeter::Cadence);
+    // Rows are written a few at a time, always before the next progress point, so that a stop
+    // or a refusal leaves the working database as writing them one by one would.
+    std::vector<WorkValue> pending;
+    pending.reserve(RowWriter::MaxRowsAtOnce * plan.columns.size());
+    auto writePending = [&]() -> Status {
+        std::size_t failedRow = 0;
+        const WriteOutcome written = writer.writeSkippingDuplicates(pending, &failedRow);
+        if (!written)
+            return Status::fault(describeRefusal(written, plan, pending[failedRow * plan.columns.size()]));
+        pending.clear();
+        return Status::ok();
+    };
     std::int64_t counter = 0;
     bool stopped = false;
     do {
-        const std::span<const QVariant> read = source.row();
-        const QString key = plan.itemLoop ? read[0].toString() : QString();
-        if (!plan.itemLoop || !key.isEmpty()) {
-            for (std::size_t i = 0; i < plan.columns.size(); ++i) {
-                const int position = columns.positions[i];
-                const QVariant &value = position >= 0 ? read[static_cast<std::size_t>(position)] : none;
-                values[i] = plan.columns[i].convert ? plan.columns[i].convert(value, key) : value;
-            }
-            if (const WriteOutcome written = writer.write(values); !written && !written.isDuplicateKey()) {
-                (void)target.commit();
-                return reportCollectFault(context, describeRefusal(written, plan, values.front()));
-            }
+        const std::span<WorkValue> row = source.row();
+        if (!plan.itemLoop || !row[0].isNull()) {
+            if (readsSettings)
+                completeOnStepThread(plan, row);
+            std::move(row.begin(), row.end(), std::back_inserter(pending));
         }
-        if (plan.itemLoop && meter.tick(++counter, total)) {
+        ++counter;
+        if (counter % ProgressMeter::Cadence != 0)
+            continue;
+        if (Status written = writePending(); !written) {
+            (void)target.commit();
+            return reportCollectFault(context, written.description());
+        }
+        if (plan.itemLoop && meter.tick(counter, total)) {
             stopped = true;
             break;
         }
     } while (source.next());
+    if (Status written = writePending(); !written) {
+        (void)target.commit();
+        return reportCollectFault(context, written.description());
+    }
 
     if (Status committed = target.commit(); !committed)
         return reportCollectFault(context, committed.description());

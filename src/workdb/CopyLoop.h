@@ -11,6 +11,8 @@ struct RunContext;
 
 // One column of a collection step's target row: its name in the working table, the source
 // column it is made from (read by name; empty for none) and how (nothing: the value as read).
+// A conversion runs on the thread that reads the source, unless it reads the settings, which
+// belong to the step's thread.
 struct CopiedColumn
 {
     using Convert = std::function<QVariant(const QVariant &sourceValue, const QString &keyText)>;
@@ -18,6 +20,7 @@ struct CopiedColumn
     QString target;
     QString source;
     Convert convert;
+    bool readsSettings = false;
 };
 
 // What a collection step copies: one statement on the accounting database into one table of

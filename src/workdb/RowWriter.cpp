@@ -1,96 +1,116 @@
 #include "workdb/RowWriter.h"
 
 #include "workdb/WorkDatabase.h"
-#include "workdb/WorkSchema.h"
 
-#include <limits>
 #include <sqlite3.h>
 
 namespace zorbin {
 namespace {
 
-// Binds one value; a text is bound as UTF-8 from `text`, which must live until the step.
-int bindValue(sqlite3_stmt *statement, int position, const QVariant &value, QByteArray &text)
+// Binds one value; a text is bound where it is, so it must stay unchanged until the step.
+int bindValue(sqlite3_stmt *statement, int position, const WorkValue &value)
 {
-    if (value.isNull())
-        return sqlite3_bind_null(statement, position);
-    switch (value.typeId()) {
-    case QMetaType::Bool:
-        return sqlite3_bind_int(statement, position, value.toBool() ? WorkTrue : WorkFalse);
-    case QMetaType::Int:
-    case QMetaType::Short:
-    case QMetaType::Char:
-    case QMetaType::SChar:
-    case QMetaType::UChar:
-    case QMetaType::UShort:
-    case QMetaType::UInt:
-    case QMetaType::Long:
-    case QMetaType::LongLong:
-        return sqlite3_bind_int64(statement, position, value.toLongLong());
-    case QMetaType::ULong:
-    case QMetaType::ULongLong:
-        if (value.toULongLong() <= static_cast<qulonglong>(std::numeric_limits<sqlite3_int64>::max()))
-            return sqlite3_bind_int64(statement, position, value.toLongLong());
-        return sqlite3_bind_double(statement, position, value.toDouble());
-    case QMetaType::Double:
-    case QMetaType::Float:
-        return sqlite3_bind_double(statement, position, value.toDouble());
-    case QMetaType::QString:
-        text = static_cast<const QString *>(value.constData())->toUtf8();
-        break;
-    default:
-        text = value.toString().toUtf8();
-        break;
-    }
-    // SQLite keeps text as UTF-8: converting here, in one pass, is cheaper than letting it convert.
-    return sqlite3_bind_text(statement, position, text.constData(), static_cast<int>(text.size()),
-                             SQLITE_STATIC);
+    if (const auto *text = std::get_if<QByteArray>(&value.value))
+        return sqlite3_bind_text(statement, position, text->constData(), static_cast<int>(text->size()),
+                                 SQLITE_STATIC);
+    if (const auto *whole = std::get_if<std::int64_t>(&value.value))
+        return sqlite3_bind_int64(statement, position, *whole);
+    if (const auto *real = std::get_if<double>(&value.value))
+        return sqlite3_bind_double(statement, position, *real);
+    return sqlite3_bind_null(statement, position);
 }
 
 } // namespace
 
 RowWriter::RowWriter(WorkDatabase &database, const QString &table, const QStringList &columns)
-    : m_handle(database.handle()), m_columnCount(static_cast<int>(columns.size())),
-      m_texts(static_cast<std::size_t>(m_columnCount))
+    : m_handle(database.handle()), m_table(table), m_columns(columns),
+      m_columnCount(static_cast<int>(columns.size()))
 {
-    QStringList marks;
-    for (int i = 0; i < m_columnCount; ++i)
-        marks << QStringLiteral("?");
-    const QByteArray sql =
-        QStringLiteral("INSERT INTO %1 (%2) VALUES (%3)")
-            .arg(table, columns.join(QStringLiteral(", ")), marks.join(QStringLiteral(", ")))
-            .toUtf8();
-    if (sqlite3_prepare_v3(m_handle, sql.constData(), static_cast<int>(sql.size()), SQLITE_PREPARE_PERSISTENT,
-                           &m_statement, nullptr) != SQLITE_OK) {
-        m_prepareError = QString::fromUtf8(sqlite3_errmsg(m_handle));
-        m_statement = nullptr;
-    }
+    statementFor(1);
 }
 
 RowWriter::~RowWriter()
 {
-    sqlite3_finalize(m_statement);
+    for (sqlite3_stmt *statement : m_statements)
+        sqlite3_finalize(statement);
 }
 
-WriteOutcome RowWriter::write(std::span<const QVariant> values)
+sqlite3_stmt *RowWriter::statementFor(std::size_t rows)
 {
-    if (!m_statement)
+    sqlite3_stmt *&statement = m_statements[rows - 1];
+    if (statement || !m_prepareError.isEmpty())
+        return statement;
+    QStringList marks;
+    for (int i = 0; i < m_columnCount; ++i)
+        marks << QStringLiteral("?");
+    const QString row = QStringLiteral("(%1)").arg(marks.join(QStringLiteral(", ")));
+    QStringList values;
+    for (std::size_t i = 0; i < rows; ++i)
+        values << row;
+    const QByteArray sql =
+        QStringLiteral("INSERT INTO %1 (%2) VALUES %3")
+            .arg(m_table, m_columns.join(QStringLiteral(", ")), values.join(QStringLiteral(", ")))
+            .toUtf8();
+    if (sqlite3_prepare_v3(m_handle, sql.constData(), static_cast<int>(sql.size()), SQLITE_PREPARE_PERSISTENT,
+                           &statement, nullptr) != SQLITE_OK) {
+        m_prepareError = QString::fromUtf8(sqlite3_errmsg(m_handle));
+        statement = nullptr;
+    }
+    return statement;
+}
+
+WriteOutcome RowWriter::step(sqlite3_stmt *statement, std::span<const WorkValue> values)
+{
+    if (!statement)
         return WriteOutcome::refused(Refusal::Other, m_prepareError);
-    Q_ASSERT(values.size() == static_cast<std::size_t>(m_columnCount));
-    for (int i = 0; i < m_columnCount; ++i) {
-        const auto at = static_cast<std::size_t>(i);
-        if (bindValue(m_statement, i + 1, values[at], m_texts[at]) != SQLITE_OK)
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        if (bindValue(statement, static_cast<int>(i + 1), values[i]) != SQLITE_OK)
             return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
                                             QString::fromUtf8(sqlite3_errmsg(m_handle)));
     }
-    const int rc = sqlite3_step(m_statement);
+    const int rc = sqlite3_step(statement);
     WriteOutcome outcome;
     if (rc != SQLITE_DONE)
         outcome = WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
                                            QString::fromUtf8(sqlite3_errmsg(m_handle)));
-    sqlite3_reset(m_statement);
-    sqlite3_clear_bindings(m_statement); // before the texts they point into change
+    // The texts stay bound until the next rows bind their own; a statement is never stepped
+    // without them.
+    sqlite3_reset(statement);
     return outcome;
+}
+
+WriteOutcome RowWriter::write(std::span<const QVariant> values)
+{
+    m_converted.clear();
+    for (const QVariant &value : values)
+        m_converted.push_back(WorkValue::from(value));
+    return write(std::span<const WorkValue>(m_converted));
+}
+
+WriteOutcome RowWriter::write(std::span<const WorkValue> values)
+{
+    Q_ASSERT(values.size() == static_cast<std::size_t>(m_columnCount));
+    return step(statementFor(1), values);
+}
+
+WriteOutcome RowWriter::writeSkippingDuplicates(std::span<const WorkValue> values, std::size_t *failedRow)
+{
+    const auto width = static_cast<std::size_t>(m_columnCount);
+    const std::size_t rows = values.size() / width;
+    Q_ASSERT(rows * width == values.size() && rows <= MaxRowsAtOnce);
+    if (rows == 0)
+        return {};
+    if (rows > 1 && step(statementFor(rows), values))
+        return {};
+    for (std::size_t row = 0; row < rows; ++row) {
+        const WriteOutcome written = step(statementFor(1), values.subspan(row * width, width));
+        if (!written && !written.isDuplicateKey()) {
+            if (failedRow)
+                *failedRow = row;
+            return written;
+        }
+    }
+    return {};
 }
 
 } // namespace zorbin

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "workdb/WorkValue.h"
 #include "workdb/WriteOutcome.h"
 
 #include <QStringList>
@@ -10,14 +11,17 @@
 struct sqlite3;
 struct sqlite3_stmt;
 
+#include <cstddef>
+
 namespace zorbin {
 
 class WorkDatabase;
 
 // Adds rows to one table of the working database, the named columns in the given order (the
-// others take their defaults: Null, and false for Include). Values are bound as they are:
-// a null QVariant writes Null, numbers stay numbers, a bool writes -1 or 0, anything else is
-// written as its text; the table's own rules then accept or refuse the row.
+// others take their defaults: Null, and false for Include). Values are written as
+// WorkValue::from() makes them: a null QVariant writes Null, numbers stay numbers, a bool
+// writes -1 or 0, anything else is written as its text; the table's own rules then accept or
+// refuse the row.
 //
 // Borrows the database, which must outlive the writer. Rows are written straight through the
 // engine, without Qt's per-statement work: the collection writes hundreds of thousands.
@@ -35,12 +39,26 @@ public:
 
     // One row: exactly one value per column given to the constructor.
     WriteOutcome write(std::span<const QVariant> values);
+    WriteOutcome write(std::span<const WorkValue> values);
+
+    // Up to MaxRowsAtOnce rows, one after the other in `values`, with the effect of writing them
+    // one by one and passing over each row the table refuses as a duplicate key: the outcome
+    // is the first other refusal, `failedRow` its row, and no row after it is written. One
+    // statement writes them all (a fifth of the work per row) unless the engine refuses it;
+    // then nothing of it was written and the rows are written one by one.
+    static constexpr std::size_t MaxRowsAtOnce = 5;
+    WriteOutcome writeSkippingDuplicates(std::span<const WorkValue> values, std::size_t *failedRow);
 
 private:
+    sqlite3_stmt *statementFor(std::size_t rows);
+    WriteOutcome step(sqlite3_stmt *statement, std::span<const WorkValue> values);
+
     sqlite3 *m_handle = nullptr;
-    sqlite3_stmt *m_statement = nullptr;
+    QString m_table;
+    QStringList m_columns;
+    sqlite3_stmt *m_statements[MaxRowsAtOnce] = {}; // [n - 1] inserts n rows; made when first needed
     int m_columnCount = 0;
-    std::vector<QByteArray> m_texts; // the UTF-8 texts bound to the statement, one per column
+    std::vector<WorkValue> m_converted; // a row of QVariants made ready to bind
     QString m_prepareError;
 };
 

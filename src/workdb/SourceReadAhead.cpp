@@ -21,10 +21,9 @@ QString describeReadError(const QSqlError &error)
 } // namespace
 
 SourceReadAhead::SourceReadAhead(QString connectionString, QString statement, QStringList columns,
-                                 bool countRows)
+                                 bool countRows, std::size_t width, const Shaper &shaper)
     : m_connectionString(std::move(connectionString)), m_statement(std::move(statement)),
-      m_columns(std::move(columns)), m_countRows(countRows),
-      m_width(static_cast<std::size_t>(m_columns.size()))
+      m_columns(std::move(columns)), m_countRows(countRows), m_width(width), m_shaper(shaper)
 {
     m_thread = std::thread([this] { read(); });
 }
@@ -42,7 +41,7 @@ SourceReadAhead::~SourceReadAhead()
 // The reading thread. The connection and its query live and die here.
 void SourceReadAhead::read()
 {
-    std::vector<QVariant> batch;
+    std::vector<WorkValue> batch;
     Result<std::unique_ptr<SourceConnection>> source = SourceConnection::open(m_connectionString);
     if (!source)
         return refuse(source.status());
@@ -66,9 +65,12 @@ void SourceReadAhead::read()
     m_changed.notify_all();
 
     batch.reserve(RowsPerBatch * m_width);
+    std::vector<QVariant> read(positions.size());
     while (rows->next()) {
-        for (const int position : positions)
-            batch.push_back(rows->value(position));
+        for (std::size_t i = 0; i < positions.size(); ++i)
+            read[i] = rows->value(positions[i]);
+        batch.resize(batch.size() + m_width);
+        m_shaper(read, std::span<WorkValue>(batch).last(m_width));
         if (batch.size() < RowsPerBatch * m_width)
             continue;
         publish(batch, false, Status::ok());
@@ -93,7 +95,7 @@ void SourceReadAhead::refuse(Status failure)
 }
 
 // Hands a batch to the step (waiting while enough are ahead), and with `last` the end.
-void SourceReadAhead::publish(std::vector<QVariant> &batch, bool last, Status failure)
+void SourceReadAhead::publish(std::vector<WorkValue> &batch, bool last, Status failure)
 {
     std::unique_lock lock(m_mutex);
     m_changed.wait(lock, [this] { return m_cancelled || m_batches.size() < BatchesAhead; });
@@ -135,9 +137,9 @@ bool SourceReadAhead::next()
     return true;
 }
 
-std::span<const QVariant> SourceReadAhead::row() const
+std::span<WorkValue> SourceReadAhead::row()
 {
-    return std::span<const QVariant>(m_current).subspan(m_position, m_width);
+    return std::span<WorkValue>(m_current).subspan(m_position, m_width);
 }
 
 Status SourceReadAhead::readFailure()

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
+#include "workdb/WorkValue.h"
 
 #include <QString>
 #include <QStringList>
@@ -8,6 +9,7 @@
 #include <condition_variable>
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <mutex>
 #include <span>
 #include <thread>
@@ -17,7 +19,8 @@ namespace zorbin {
 
 // Reads one statement's rows from the accounting database on a thread of its own, ahead of the
 // collection step that writes them, so that reading the source and writing the working
-// database overlap on two processor cores. The step still sees the rows one by one, in the
+// database overlap on two processor cores. Each row is shaped into the values of a target row
+// on the reading thread as well (see Shaper). The step still sees the rows one by one, in the
 // source's order, and everything it does with them (writing, progress, stop, messages) stays
 // on its own thread. The connection is opened, used and closed on the reading thread.
 //
@@ -26,10 +29,16 @@ namespace zorbin {
 class SourceReadAhead
 {
 public:
+    // Makes the `width` values of a target row from the values read, in the order of `columns`.
+    // Runs on the reading thread: it must not touch anything the step's thread changes.
+    using Shaper = std::function<void(std::span<const QVariant> read, std::span<WorkValue> row)>;
+
     // Starts reading: opens a connection from `connectionString`, counts the statement's rows
-    // first when `countRows` is set (see countSourceRows), runs the statement, and reads the
-    // `columns` (by name, letter case aside) of every row.
-    SourceReadAhead(QString connectionString, QString statement, QStringList columns, bool countRows);
+    // first when `countRows` is set (see countSourceRows), runs the statement, reads the
+    // `columns` (by name, letter case aside) of every row and shapes them. The shaper must
+    // outlive the object.
+    SourceReadAhead(QString connectionString, QString statement, QStringList columns, bool countRows,
+                    std::size_t width, const Shaper &shaper);
     ~SourceReadAhead();
 
     SourceReadAhead(const SourceReadAhead &) = delete;
@@ -43,21 +52,22 @@ public:
 
     // Moves to the next row; false at the end of the rows or when reading failed.
     bool next();
-    // The current row's values, in the order of `columns`; a Null is a null QVariant.
-    std::span<const QVariant> row() const;
+    // The current row, as the shaper made it; the step may change it.
+    std::span<WorkValue> row();
     // Why reading ended before the last row; ok when it reached the end.
     Status readFailure();
 
 private:
     void read();
     void refuse(Status failure);
-    void publish(std::vector<QVariant> &batch, bool last, Status failure);
+    void publish(std::vector<WorkValue> &batch, bool last, Status failure);
 
     const QString m_connectionString;
     const QString m_statement;
     const QStringList m_columns;
     const bool m_countRows;
     const std::size_t m_width;
+    const Shaper &m_shaper;
 
     std::mutex m_mutex;
     std::condition_variable m_changed;
@@ -66,11 +76,11 @@ private:
     bool m_cancelled = false; // the step no longer wants rows
     Status m_refusal;         // why the statement did not run
     Status m_failure;         // why reading ended early
-    std::deque<std::vector<QVariant>> m_batches;
+    std::deque<std::vector<WorkValue>> m_batches;
     std::int64_t m_total = 0;
 
-    std::vector<QVariant> m_current; // the batch the step is reading
-    std::size_t m_position = 0;      // of the current row in m_current, in values
+    std::vector<WorkValue> m_current; // the batch the step is reading
+    std::size_t m_position = 0;       // of the current row in m_current, in values
     bool m_started = false;
 
     std::thread m_thread;
