@@ -1,9 +1,9 @@
 // zorbin: the desktop program, a window that hosts the catalog control.
-#include "card/MainCard.h"
+#include "card/CardWindow.h"
 #include "platform/SettingsStore.h"
 
 #include <QApplication>
-#include <QMainWindow>
+#include <QIcon>
 
 int main(int argc, char *argv[])
 {
@@ -13,12 +13,12 @@ int main(int argc, char *argv[])
     QApplication::setApplicationVersion(QStringLiteral(ZORBIN_VERSION));
     QApplication::setDesktopFileName(QStringLiteral("zorbin"));
     QApplication::setLayoutDirection(Qt::RightToLeft);
+    QApplication::setWindowIcon(
+        QIcon::fromTheme(QStringLiteral("zorbin"), QIcon(QStringLiteral(":/zorbin.png"))));
 
     const auto store = zorbin::openUserSettingsStore();
-    QMainWindow window;
-    window.setWindowTitle(QStringLiteral("זורבין - קטלוג מוצרים"));
-    window.setCentralWidget(new zorbin::MainCard(*store, {}, &window));
-    window.resize(820, 640);
+    zorbin::CardWindow window(*store);
+    window.resize(window.sizeHint().expandedTo(QSize(860, 640)));
     window.show();
     return QApplication::exec();
 }

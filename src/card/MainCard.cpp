@@ -1,7 +1,16 @@
 #include "card/MainCard.h"
 
+#include "card/FileChooser.h"
 #include "card/ProgressStrip.h"
+#include "card/SettingsBinder.h"
 #include "card/WidgetUserPort.h"
+#include "card/tabs/AboutTab.h"
+#include "card/tabs/DataTab.h"
+#include "card/tabs/GeneralTab.h"
+#include "card/tabs/PageSetupTab.h"
+#include "card/tabs/RangeTab.h"
+#include "card/tabs/TitlesTab.h"
+#include "dialogs/CellLineEditor.h"
 #include "platform/FileSystem.h"
 
 #include <QHBoxLayout>
@@ -12,30 +21,65 @@
 
 namespace zorbin {
 
-MainCard::MainCard(SettingsStore &store, CatalogControl::StagesFactory stages, QWidget *parent) : QWidget(parent)
+MainCard::MainCard(SettingsStore &store, CatalogControl::StagesFactory stages, QWidget *parent)
+    : QWidget(parent)
 {
     setObjectName(QStringLiteral("MainCard"));
     setLayoutDirection(Qt::RightToLeft);
-    buildLayout();
-    m_user = std::make_unique<WidgetUserPort>(this, m_Message1, m_progress, [this](bool busy) { setBusy(busy); });
+
+    m_Message1 = new QLabel(this);
+    m_Message1->setObjectName(QStringLiteral("Message1"));
+    m_Message1->setAccessibleName(QStringLiteral("שורת מצב"));
+    m_progress = new ProgressStrip(this);
+    m_user =
+        std::make_unique<WidgetUserPort>(this, m_Message1, m_progress, [this](bool busy) { setBusy(busy); });
     m_control = std::make_unique<CatalogControl>(*m_user, store, localFileSystem(), std::move(stages));
+    m_binder = std::make_unique<SettingsBinder>();
+    m_context = std::make_unique<CardContext>(CardContext{*m_control, *m_binder, &systemFileChooser()});
+
+    buildTabs();
+    auto *layout = new QVBoxLayout(this);
+    layout->addWidget(m_tabs, 1);
+    layout->addLayout(buildCommands());
+    layout->addWidget(m_Message1);
+    layout->addWidget(m_progress);
+
     m_control->UserControl_Initialize();
-    m_tabs->setCurrentIndex(RangeTab);
+    m_binder->refresh();
+    m_tabs->setCurrentIndex(RangePage);
 }
 
-MainCard::~MainCard() = default;
+MainCard::~MainCard()
+{
+    // The widgets are bound to the control's settings record: they go first.
+    const auto children = findChildren<QWidget *>(QString(), Qt::FindDirectChildrenOnly);
+    for (QWidget *child : children)
+        delete child;
+}
 
-void MainCard::buildLayout()
+void MainCard::buildTabs()
 {
     m_tabs = new QTabWidget(this);
     m_tabs->setObjectName(QStringLiteral("SSTab1"));
-    const QStringList captions = {
-        QStringLiteral("הגדרת עמוד בקטלוג"), QStringLiteral("כותרות לעמוד"), QStringLiteral("הגדרות נתונים"),
-        QStringLiteral("טווח הפריטים"),      QStringLiteral("אודות"),        QStringLiteral("כללי"),
-    };
-    for (const QString &caption : captions)
-        m_tabs->addTab(new QWidget(m_tabs), caption);
+    m_tabs->setDocumentMode(false);
+    m_pageSetupTab = new PageSetupTab(*m_context, m_tabs);
+    m_titlesTab = new TitlesTab(*m_context, m_tabs);
+    m_rangeTab = new RangeTab(*m_context, m_tabs);
+    m_generalTab = new GeneralTab(*m_context, m_tabs);
+    m_tabs->addTab(m_pageSetupTab, QStringLiteral("הגדרת עמוד בקטלוג"));
+    m_tabs->addTab(m_titlesTab, QStringLiteral("כותרות לעמוד"));
+    m_tabs->addTab(new DataTab(*m_context, m_tabs), QStringLiteral("הגדרות נתונים"));
+    m_tabs->addTab(m_rangeTab, QStringLiteral("טווח הפריטים"));
+    m_tabs->addTab(new AboutTab(m_tabs), QStringLiteral("אודות"));
+    m_tabs->addTab(m_generalTab, QStringLiteral("כללי"));
+    connect(m_tabs, &QTabWidget::currentChanged, this, [this](int index) {
+        if (index == PageSetupPage)
+            m_pageSetupTab->editor()->resetSelection();
+    });
+}
 
+QLayout *MainCard::buildCommands()
+{
     auto button = [this](const char *name, const QString &caption) {
         auto *created = new QPushButton(caption, this);
         created->setObjectName(QLatin1String(name));
@@ -45,11 +89,13 @@ void MainCard::buildLayout()
     m_CmdPreview = button("CmdPreview", QStringLiteral("הצג רשימה"));
     m_cmdStop = button("cmdStop", QStringLiteral("עצור"));
     m_CmdDef = button("CmdDef", QStringLiteral("שמור הגדרות"));
+    m_cmdRunMailing->setDefault(true);
     m_cmdStop->setEnabled(false);
 
-    m_Message1 = new QLabel(this);
-    m_Message1->setObjectName(QStringLiteral("Message1"));
-    m_progress = new ProgressStrip(this);
+    connect(m_cmdRunMailing, &QPushButton::clicked, this, [this] { m_control->cmdRunMailing_Click(); });
+    connect(m_CmdPreview, &QPushButton::clicked, this, [this] { m_control->CmdPreview_Click(); });
+    connect(m_cmdStop, &QPushButton::clicked, this, [this] { m_control->cmdStop_Click(); });
+    connect(m_CmdDef, &QPushButton::clicked, this, [this] { m_control->CmdDef_Click(); });
 
     auto *buttons = new QHBoxLayout;
     buttons->addWidget(m_cmdRunMailing);
@@ -57,17 +103,17 @@ void MainCard::buildLayout()
     buttons->addWidget(m_cmdStop);
     buttons->addStretch();
     buttons->addWidget(m_CmdDef);
+    return buttons;
+}
 
-    auto *layout = new QVBoxLayout(this);
-    layout->addWidget(m_tabs, 1);
-    layout->addLayout(buttons);
-    layout->addWidget(m_Message1);
-    layout->addWidget(m_progress);
+void MainCard::setFileChooser(FileChooser &chooser)
+{
+    m_context->files = &chooser;
+}
 
-    connect(m_cmdRunMailing, &QPushButton::clicked, this, [this] { m_control->cmdRunMailing_Click(); });
-    connect(m_CmdPreview, &QPushButton::clicked, this, [this] { m_control->CmdPreview_Click(); });
-    connect(m_cmdStop, &QPushButton::clicked, this, [this] { m_control->cmdStop_Click(); });
-    connect(m_CmdDef, &QPushButton::clicked, this, [this] { m_control->CmdDef_Click(); });
+void MainCard::showSettings()
+{
+    m_binder->refresh();
 }
 
 void MainCard::setBusy(bool busy)
@@ -76,6 +122,12 @@ void MainCard::setBusy(bool busy)
     m_CmdPreview->setEnabled(!busy);
     m_CmdDef->setEnabled(!busy);
     m_cmdStop->setEnabled(busy);
+    // The runs read the settings as they go: they stay as they were until the run ends.
+    for (int i = 0; i < m_tabs->count(); ++i)
+        m_tabs->widget(i)->setEnabled(!busy);
+    if (!busy)
+        m_binder->refresh();
+    Q_EMIT busyChanged(busy);
 }
 
 } // namespace zorbin

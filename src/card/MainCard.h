@@ -1,9 +1,9 @@
 #pragma once
 
+#include "card/CardContext.h"
 #include "control/CatalogControl.h"
 
 #include <QWidget>
-
 #include <memory>
 
 class QLabel;
@@ -12,31 +12,68 @@ class QTabWidget;
 
 namespace zorbin {
 
+class FileChooser;
+class PageSetupTab;
 class ProgressStrip;
+class RangeTab;
+class SettingsBinder;
+class TitlesTab;
+class GeneralTab;
 class WidgetUserPort;
 
 // The settings control: six tabs bound to the control's settings record, the command buttons,
 // the status line and the progress bar. It forwards the buttons to its CatalogControl.
+//
+// Created, it loads the connection, the lists from the accounting database and the stored
+// settings, shows them, and opens on the item-range tab. While a run is in progress the run
+// buttons, the save button and the settings are disabled and only the stop button works.
 class MainCard : public QWidget
 {
     Q_OBJECT
 
 public:
     // `store` must outlive the card. Without a factory the standard stages are used.
-    explicit MainCard(SettingsStore &store, CatalogControl::StagesFactory stages = {}, QWidget *parent = nullptr);
+    explicit MainCard(SettingsStore &store, CatalogControl::StagesFactory stages = {},
+                      QWidget *parent = nullptr);
     ~MainCard() override;
 
     CatalogControl &control() { return *m_control; }
     QTabWidget *tabs() const { return m_tabs; }
+    PageSetupTab *pageSetupTab() const { return m_pageSetupTab; }
+    TitlesTab *titlesTab() const { return m_titlesTab; }
+    RangeTab *rangeTab() const { return m_rangeTab; }
+    GeneralTab *generalTab() const { return m_generalTab; }
+
+    // Replaces the file dialogs (a test answers them); `chooser` must outlive the card.
+    void setFileChooser(FileChooser &chooser);
+    // The widgets show the settings record again (after the core changed it).
+    void showSettings();
+    bool isRunning() const { return m_control->isRunning(); }
 
     // Index of each tab of `SSTab1`.
-    enum Tab { PageSetupTab = 0, TitlesTab = 1, DataTab = 2, RangeTab = 3, AboutTab = 4, GeneralTab = 5 };
+    enum TabIndex {
+        PageSetupPage = 0,
+        TitlesPage = 1,
+        DataPage = 2,
+        RangePage = 3,
+        AboutPage = 4,
+        GeneralPage = 5
+    };
+
+Q_SIGNALS:
+    // A run started (true) or ended (false).
+    void busyChanged(bool busy);
 
 private:
-    void buildLayout();
+    void buildTabs();
+    QLayout *buildCommands();
     void setBusy(bool busy);
 
     QTabWidget *m_tabs = nullptr;
+    PageSetupTab *m_pageSetupTab = nullptr;
+    TitlesTab *m_titlesTab = nullptr;
+    RangeTab *m_rangeTab = nullptr;
+    GeneralTab *m_generalTab = nullptr;
     QPushButton *m_cmdRunMailing = nullptr;
     QPushButton *m_CmdPreview = nullptr;
     QPushButton *m_cmdStop = nullptr;
@@ -45,6 +82,8 @@ private:
     ProgressStrip *m_progress = nullptr;
     std::unique_ptr<WidgetUserPort> m_user;
     std::unique_ptr<CatalogControl> m_control;
+    std::unique_ptr<SettingsBinder> m_binder;
+    std::unique_ptr<CardContext> m_context;
 };
 
 } // namespace zorbin

@@ -2,7 +2,6 @@
 
 #include <QPainter>
 #include <QPalette>
-
 #include <algorithm>
 
 namespace zorbin {

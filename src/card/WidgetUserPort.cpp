@@ -33,8 +33,7 @@ QMessageBox::Icon boxIcon(MessageIcon icon)
 WidgetUserPort::WidgetUserPort(QWidget *owner, QLabel *statusLine, ProgressStrip *progress,
                                std::function<void(bool)> onBusy)
     : m_owner(owner), m_statusLine(statusLine), m_progress(progress), m_onBusy(std::move(onBusy))
-{
-}
+{}
 
 Answer WidgetUserPort::ask(const QString &text, const QString &title, QuestionButtons buttons)
 {

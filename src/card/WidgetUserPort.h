@@ -17,7 +17,8 @@ class WidgetUserPort final : public UserPort
 {
 public:
     // All widgets must outlive the port. `onBusy` enables and disables the control's buttons.
-    WidgetUserPort(QWidget *owner, QLabel *statusLine, ProgressStrip *progress, std::function<void(bool)> onBusy);
+    WidgetUserPort(QWidget *owner, QLabel *statusLine, ProgressStrip *progress,
+                   std::function<void(bool)> onBusy);
 
     Answer ask(const QString &text, const QString &title, QuestionButtons buttons) override;
     void tell(const QString &text, const QString &title, MessageIcon icon) override;

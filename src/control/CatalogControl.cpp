@@ -1,6 +1,7 @@
 #include "control/CatalogControl.h"
 
 #include "control/OutputFolder.h"
+#include "control/SettingsValidation.h"
 #include "control/StandardStages.h"
 #include "control/UserPort.h"
 #include "platform/FileSystem.h"
@@ -115,6 +116,9 @@ RunOutcome CatalogControl::produceCatalog()
 {
     if (m_running)
         return {};
+    // A number the pages cannot use is named before anything is collected or deleted.
+    if (const Status valid = validateNumericSettings(m_settings); !valid)
+        return fail(valid);
     BusyScope busy(*this);
     // A stop pressed while idle must not cut this run short.
     m_state.StopRequested = false;

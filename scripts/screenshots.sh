@@ -1,0 +1,9 @@
+#!/usr/bin/env bash
+# Pictures of the desktop program (each tab, the connection dialog, the item selection dialog)
+# under a virtual display, into docs/screenshots/. Builds first; needs xvfb (scripts/install-deps.sh).
+set -euo pipefail
+cd "$(dirname "$0")/.."
+build_dir=${BUILD_DIR:-build}
+scripts/build.sh >/dev/null
+cmake --build "$build_dir" --target card-screenshots >/dev/null
+xvfb-run -a -s "-screen 0 1280x900x24" "$build_dir/tests/card/card-screenshots" docs/screenshots

@@ -1,0 +1,144 @@
+#include "card/tabs/DataTab.h"
+
+#include "card/CardContext.h"
+#include "card/FolderField.h"
+#include "card/SettingsBinder.h"
+#include "card/tabs/TabBuilding.h"
+#include "control/CatalogControl.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QGridLayout>
+#include <QGroupBox>
+#include <QHBoxLayout>
+#include <QLineEdit>
+#include <QRadioButton>
+#include <QVBoxLayout>
+
+namespace zorbin {
+
+using tabs::captionFor;
+using tabs::named;
+
+namespace {
+
+// What a list shows with no entry selected (an accounting database that could not be reached
+// leaves its lists empty).
+const QString NoEntryText = QStringLiteral("(לא נבחר)");
+
+// A check box that switches a choice on, and the list to choose from.
+void addSwitchedChoice(QGridLayout *grid, int row, SettingsBinder &bind, const QString &checkName,
+                       const QString &caption, CheckValue &use, const QString &listName, ChoiceList &list)
+{
+    QWidget *parent = grid->parentWidget();
+    auto *useBox = named<QCheckBox>(checkName, caption, parent);
+    auto *choice = named<QComboBox>(listName, parent);
+    bind.check(useBox, use);
+    bind.choice(choice, list);
+    choice->setAccessibleName(QString(caption).remove(QLatin1Char(':')));
+    choice->setSizeAdjustPolicy(QComboBox::AdjustToContents);
+    choice->setMinimumContentsLength(18);
+    choice->setPlaceholderText(NoEntryText);
+    grid->addWidget(useBox, row, 0);
+    grid->addWidget(choice, row, 1);
+}
+
+} // namespace
+
+DataTab::DataTab(CardContext &context, QWidget *parent) : QWidget(parent), m_context(context)
+{
+    setObjectName(QStringLiteral("DataTab"));
+    auto *layout = new QVBoxLayout(this);
+    layout->addWidget(buildNames());
+    layout->addWidget(buildPrices());
+    layout->addWidget(buildNotes());
+    layout->addWidget(buildPictures());
+    layout->addStretch();
+}
+
+QWidget *DataTab::buildNames()
+{
+    auto *group = new QGroupBox(QStringLiteral("שם הפריט"), this);
+    auto *source = named<QComboBox>(QStringLiteral("CmbItemNameType"), group);
+    m_context.binder.choice(source, m_context.control.settings().CmbItemNameType);
+    auto *layout = new QHBoxLayout(group);
+    layout->addWidget(captionFor(QStringLiteral("השם שיוצג:"), source, group));
+    layout->addWidget(source);
+    layout->addStretch();
+    return group;
+}
+
+QWidget *DataTab::buildPrices()
+{
+    CatalogSettings &settings = m_context.control.settings();
+    auto *group = new QGroupBox(QStringLiteral("מחירונים"), this);
+    auto *grid = new QGridLayout(group);
+    addSwitchedChoice(grid, 0, m_context.binder, QStringLiteral("chkUsePriceField"),
+                      QStringLiteral("מחיר 1:"), settings.chkUsePriceField, QStringLiteral("cmbPriceField"),
+                      settings.cmbPriceField);
+    addSwitchedChoice(grid, 1, m_context.binder, QStringLiteral("ChkUsePriceField2"),
+                      QStringLiteral("מחיר 2:"), settings.ChkUsePriceField2, QStringLiteral("cmbPriceField2"),
+                      settings.cmbPriceField2);
+    grid->setColumnStretch(2, 1);
+    return group;
+}
+
+QWidget *DataTab::buildNotes()
+{
+    CatalogSettings &settings = m_context.control.settings();
+    auto *group = new QGroupBox(QStringLiteral("נתונים נוספים"), this);
+    auto *grid = new QGridLayout(group);
+    addSwitchedChoice(grid, 0, m_context.binder, QStringLiteral("ChkUseExtraNote1"),
+                      QStringLiteral("נתון נוסף 1:"), settings.ChkUseExtraNote1,
+                      QStringLiteral("cmbExtraNote1"), settings.cmbExtraNote1);
+    addSwitchedChoice(grid, 1, m_context.binder, QStringLiteral("ChkUseExtraNote2"),
+                      QStringLiteral("נתון נוסף 2:"), settings.ChkUseExtraNote2,
+                      QStringLiteral("cmbExtraNote2"), settings.cmbExtraNote2);
+    grid->setColumnStretch(2, 1);
+    return group;
+}
+
+QWidget *DataTab::buildPictures()
+{
+    CatalogSettings &settings = m_context.control.settings();
+    SettingsBinder &bind = m_context.binder;
+    auto *group = new QGroupBox(QStringLiteral("מקור התמונה"), this);
+    const QStringList captions = {QStringLiteral("מתוך שדה 'קובץ'"), QStringLiteral("על בסיס מפתח פריט:"),
+                                  QStringLiteral("מתוך נתון נוסף:")};
+    std::vector<QRadioButton *> options;
+    for (int i = 0; i < captions.size(); ++i)
+        options.push_back(
+            named<QRadioButton>(QStringLiteral("OptPicSource(%1)").arg(i), captions.at(i), group));
+    bind.options(options, settings.OptPicSource);
+
+    auto *folder = named<QLineEdit>(QStringLiteral("txtPicPath"), group);
+    auto *extension = named<QLineEdit>(QStringLiteral("txtPicExtension"), group);
+    auto *note = named<QComboBox>(QStringLiteral("cmbPicExtraNote"), group);
+    bind.text(folder, settings.txtPicPath);
+    bind.text(extension, settings.txtPicExtension);
+    bind.choice(note, settings.cmbPicExtraNote);
+    tabs::fitToCharacters(extension, 5);
+    tabs::showLeftToRight(folder);
+    tabs::showLeftToRight(extension);
+    note->setPlaceholderText(NoEntryText);
+    note->setSizeAdjustPolicy(QComboBox::AdjustToContents);
+    note->setMinimumContentsLength(18);
+    note->setAccessibleName(captions.at(2));
+    auto *folderField = new FolderField(folder, QStringLiteral("cmdPicPath"),
+                                        QStringLiteral("בחירת מחיצת התמונות"), true, m_context, group);
+
+    auto *grid = new QGridLayout(group);
+    grid->addWidget(options[0], 0, 0, 1, 4);
+    grid->addWidget(options[1], 1, 0, 1, 4);
+    grid->addWidget(captionFor(QStringLiteral("מחיצת תמונות:"), folder, group), 2, 1);
+    grid->addWidget(folderField, 2, 2);
+    grid->addWidget(captionFor(QStringLiteral("סיומת:"), extension, group), 3, 1);
+    grid->addWidget(extension, 3, 2, Qt::AlignRight | Qt::AlignAbsolute);  // beside its caption
+    grid->addWidget(options[2], 4, 0, 1, 4);
+    grid->addWidget(note, 5, 2, Qt::AlignLeading);
+    grid->setColumnMinimumWidth(0, 16);
+    grid->setColumnStretch(2, 1);
+    return group;
+}
+
+} // namespace zorbin

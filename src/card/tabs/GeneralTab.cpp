@@ -1,0 +1,56 @@
+#include "card/tabs/GeneralTab.h"
+
+#include "card/CardContext.h"
+#include "card/FolderField.h"
+#include "card/SettingsBinder.h"
+#include "card/tabs/TabBuilding.h"
+#include "control/CatalogControl.h"
+
+#include <QGridLayout>
+#include <QGroupBox>
+#include <QHBoxLayout>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QVBoxLayout>
+
+namespace zorbin {
+
+using tabs::captionFor;
+using tabs::named;
+
+GeneralTab::GeneralTab(CardContext &context, QWidget *parent) : QWidget(parent), m_context(context)
+{
+    setObjectName(QStringLiteral("GeneralTab"));
+    auto *outputGroup = new QGroupBox(QStringLiteral("פלט"), this);
+    auto *folder = named<QLineEdit>(QStringLiteral("txtPagingPath"), outputGroup);
+    context.binder.text(folder, context.control.settings().txtPagingPath);
+    tabs::showLeftToRight(folder);
+    folder->setPlaceholderText(QStringLiteral("ריק: המחיצה הזמנית של המשתמש"));
+    auto *folderField =
+        new FolderField(folder, QStringLiteral("cmdPagingPath"), QStringLiteral("בחירת מחיצת היעד לקטלוג"),
+                        false, context, outputGroup);
+    auto *outputLayout = new QGridLayout(outputGroup);
+    outputLayout->addWidget(captionFor(QStringLiteral("מחיצת יעד לקטלוג:"), folder, outputGroup), 0, 0);
+    outputLayout->addWidget(folderField, 0, 1);
+    outputLayout->setColumnStretch(1, 1);
+
+    auto *sourceGroup = new QGroupBox(QStringLiteral("מקור הנתונים"), this);
+    auto *connectButton = named<QPushButton>(QStringLiteral("CmdConnect"),
+                                             QStringLiteral("הגדרות התחברות לויזקאונט"), sourceGroup);
+    connect(connectButton, &QPushButton::clicked, this, &GeneralTab::CmdConnect_Click);
+    auto *sourceLayout = new QHBoxLayout(sourceGroup);
+    sourceLayout->addWidget(connectButton);
+    sourceLayout->addStretch();
+
+    auto *layout = new QVBoxLayout(this);
+    layout->addWidget(outputGroup);
+    layout->addWidget(sourceGroup);
+    layout->addStretch();
+}
+
+void GeneralTab::CmdConnect_Click()
+{
+    // The connection dialog arrives with the accounting-database access.
+}
+
+} // namespace zorbin

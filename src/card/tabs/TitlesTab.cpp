@@ -1,0 +1,133 @@
+#include "card/tabs/TitlesTab.h"
+
+#include "card/CardContext.h"
+#include "card/FileChooser.h"
+#include "card/SettingsBinder.h"
+#include "card/tabs/TabBuilding.h"
+#include "control/CatalogControl.h"
+
+#include <QFileInfo>
+#include <QGridLayout>
+#include <QGroupBox>
+#include <QHBoxLayout>
+#include <QImageReader>
+#include <QLineEdit>
+#include <QStyle>
+#include <QToolButton>
+#include <QVBoxLayout>
+
+namespace zorbin {
+
+using tabs::captionFor;
+using tabs::named;
+
+namespace {
+
+constexpr int LogoPreviewSize = 24;
+
+} // namespace
+
+TitlesTab::TitlesTab(CardContext &context, QWidget *parent) : QWidget(parent), m_context(context)
+{
+    setObjectName(QStringLiteral("TitlesTab"));
+    auto *layout = new QVBoxLayout(this);
+    layout->addWidget(buildTitles());
+    layout->addWidget(buildBands());
+    layout->addStretch();
+}
+
+QWidget *TitlesTab::buildTitles()
+{
+    CatalogSettings &settings = m_context.control.settings();
+    SettingsBinder &bind = m_context.binder;
+    auto *group = new QGroupBox(QStringLiteral("כותרות"), this);
+    auto *top = named<QLineEdit>(QStringLiteral("txtTopTitle"), group);
+    auto *second = named<QLineEdit>(QStringLiteral("txtTopTitle2"), group);
+    auto *bottom = named<QLineEdit>(QStringLiteral("txtBottomTitle"), group);
+    m_txtLogo = named<QLineEdit>(QStringLiteral("txtLogo"), group);
+    bind.text(top, settings.txtTopTitle);
+    bind.text(second, settings.txtTopTitle2);
+    bind.text(bottom, settings.txtBottomTitle);
+    bind.text(m_txtLogo, settings.txtLogo);
+    tabs::showLeftToRight(m_txtLogo);
+
+    m_imgLogo = named<QToolButton>(QStringLiteral("imgLogo"), group);
+    m_imgLogo->setToolTip(QStringLiteral("בחירת קובץ הסמל"));
+    m_imgLogo->setAccessibleName(QStringLiteral("בחירת קובץ הסמל"));
+    m_imgLogo->setIconSize(QSize(LogoPreviewSize, LogoPreviewSize));
+    m_imgLogo->setAutoRaise(false);
+    connect(m_imgLogo, &QToolButton::clicked, this, &TitlesTab::imgLogo_Click);
+    connect(m_txtLogo, &QLineEdit::textChanged, this, &TitlesTab::showLogo);
+    showLogo();
+
+    auto *logoRow = new QHBoxLayout;
+    logoRow->addWidget(m_txtLogo, 1);
+    logoRow->addWidget(m_imgLogo);
+
+    auto *grid = new QGridLayout(group);
+    grid->addWidget(captionFor(QStringLiteral("כותרת עליונה:"), top, group), 0, 0);
+    grid->addWidget(top, 0, 1);
+    grid->addWidget(captionFor(QStringLiteral("כותרת עליונה משנית:"), second, group), 1, 0);
+    grid->addWidget(second, 1, 1);
+    grid->addWidget(captionFor(QStringLiteral("כותרת תחתונה:"), bottom, group), 2, 0);
+    grid->addWidget(bottom, 2, 1);
+    grid->addWidget(captionFor(QStringLiteral("סמל (לוגו):"), m_txtLogo, group), 3, 0);
+    grid->addLayout(logoRow, 3, 1);
+    grid->setColumnStretch(1, 1);
+    return group;
+}
+
+QWidget *TitlesTab::buildBands()
+{
+    CatalogSettings &settings = m_context.control.settings();
+    auto *group = new QGroupBox(QStringLiteral("גובה רצועות הכותרת"), this);
+    auto *top = named<QLineEdit>(QStringLiteral("txtTopPercent"), group);
+    auto *bottom = named<QLineEdit>(QStringLiteral("txtBottomPercent"), group);
+    m_context.binder.number(top, settings.txtTopPercent, MaxLengthPercent, NumericSetting::TopPercent);
+    m_context.binder.number(bottom, settings.txtBottomPercent, MaxLengthPercent,
+                            NumericSetting::BottomPercent);
+    tabs::fitToCharacters(top, MaxLengthPercent);
+    tabs::fitToCharacters(bottom, MaxLengthPercent);
+
+    auto *grid = new QGridLayout(group);
+    grid->addWidget(captionFor(QStringLiteral("גובה הכותרת העליונה:"), top, group), 0, 0);
+    grid->addWidget(top, 0, 1);
+    grid->addWidget(new QLabel(QStringLiteral("אחוז מהעמוד"), group), 0, 2);
+    grid->addWidget(captionFor(QStringLiteral("גובה הכותרת התחתונה:"), bottom, group), 1, 0);
+    grid->addWidget(bottom, 1, 1);
+    grid->addWidget(new QLabel(QStringLiteral("אחוז מהעמוד"), group), 1, 2);
+    grid->setColumnStretch(3, 1);
+    return group;
+}
+
+void TitlesTab::imgLogo_Click()
+{
+    FileChooser::FileRequest request;
+    request.nameFilters = {QStringLiteral("All Files (*.*)"),
+                           QStringLiteral("Image files (GIF,JPG,PNG) (*.GIF *.JPG *.JPEG *.PNG)")};
+    request.selectedFilter = 1; // the picture files are offered first
+    request.startPath = m_lastLogoChoice;
+    const auto chosen = m_context.files->openFile(window(), request);
+    if (!chosen || chosen->isEmpty())
+        return;
+    m_lastLogoChoice = *chosen;
+    m_txtLogo->setText(*chosen);
+}
+
+void TitlesTab::showLogo()
+{
+    // The button shows the logo itself once it names a picture that can be read.
+    QImageReader reader(m_txtLogo->text());
+    reader.setAutoTransform(true);
+    QImage logo;
+    if (!m_txtLogo->text().isEmpty() && QFileInfo(m_txtLogo->text()).isFile())
+        logo = reader.read();
+    if (logo.isNull()) {
+        m_imgLogo->setIcon(style()->standardIcon(QStyle::SP_DirOpenIcon));
+        return;
+    }
+    m_imgLogo->setIcon(QPixmap::fromImage(
+        logo.scaled(LogoPreviewSize, LogoPreviewSize, Qt::KeepAspectRatio, Qt::SmoothTransformation)));
+}
+
+} // namespace zorbin

@@ -1,0 +1,70 @@
+#include "card/CardWindow.h"
+
+#include "card/MainCard.h"
+#include "control/ProgressMeter.h"
+#include "control/UserPort.h"
+#include "testutil/MemorySettingsStore.h"
+#include "testutil/RecordingStages.h"
+#include "testutil/TestMain.h"
+
+#include <QPushButton>
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace zorbin;
+using namespace zorbin::test;
+
+class CardWindowTest : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void closingDuringARunStopsItAndClosesAfterwards()
+    {
+        QTemporaryDir output;
+        qputenv("ZORBIN_BROWSER", "true");
+        MemorySettingsStore store;
+        RecordingStages *stages = nullptr;
+        CardWindow window(store, [&stages](RunContext &context, SettingsStore &) {
+            auto made = std::make_unique<RecordingStages>(context);
+            stages = made.get();
+            return made;
+        });
+        window.card()->control().settings().txtPagingPath = output.path();
+        window.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&window));
+
+        bool closedAtOnce = true;
+        int rows = 0;
+        stages->during = [&](const QString &stage) {
+            if (stage != QLatin1String("BuildAndCollectData"))
+                return;
+            closedAtOnce = window.close();
+            RunContext &context = window.card()->control().context();
+            ProgressMeter meter(context.user, context.state);
+            for (rows = 1; rows <= 100; ++rows) {
+                if (meter.tick(rows, 100))
+                    break;
+            }
+        };
+        QVERIFY(window.card()->control().produceCatalog().ending != RunOutcome::Ending::Declined);
+        QVERIFY(!closedAtOnce);
+        QCOMPARE(rows, 5);                                              // the close pressed stop
+        QVERIFY(stages->names().contains(QStringLiteral("CreateCSS"))); // the run ended in order
+        QTRY_VERIFY(!window.isVisible());
+    }
+
+    void closingWhileIdleCloses()
+    {
+        MemorySettingsStore store;
+        CardWindow window(store, [](RunContext &context, SettingsStore &) {
+            return std::make_unique<RecordingStages>(context);
+        });
+        window.show();
+        QVERIFY(window.close());
+        QVERIFY(!window.isVisible());
+    }
+};
+
+ZORBIN_TEST_CLASS(CardWindowTest)
+#include "CardWindowTest.moc"

@@ -1,0 +1,68 @@
+// card-screenshots: pictures of the desktop program for the documentation. Run it under a
+// display (scripts/screenshots.sh starts a virtual one): it opens the main window on the demo
+// database's settings, grabs each tab and the dialogs, and writes PNG files into the folder
+// given as its one argument.
+#include "card/CardWindow.h"
+#include "card/MainCard.h"
+#include "platform/SettingsStore.h"
+#include "testutil/TestFiles.h"
+
+#include <QApplication>
+#include <QDir>
+#include <QTabWidget>
+#include <QTest>
+#include <cstdio>
+
+using namespace zorbin;
+
+namespace {
+
+bool save(QWidget *widget, const QDir &folder, const QString &name)
+{
+    QTest::qWait(200); // let the window system settle, as a user would see it
+    const QString path = folder.filePath(name + QStringLiteral(".png"));
+    if (!widget->grab().save(path)) {
+        std::fprintf(stderr, "cannot write %s\n", qPrintable(path));
+        return false;
+    }
+    std::printf("%s\n", qPrintable(path));
+    return true;
+}
+
+} // namespace
+
+int main(int argc, char *argv[])
+{
+    QApplication app(argc, argv);
+    QApplication::setApplicationName(QStringLiteral("Zorbin"));
+    QApplication::setApplicationDisplayName(QStringLiteral("זורבין"));
+    QApplication::setLayoutDirection(Qt::RightToLeft);
+    if (argc != 2) {
+        std::fprintf(stderr, "usage: card-screenshots FOLDER\n");
+        return 2;
+    }
+    const QDir folder(QString::fromLocal8Bit(argv[1]));
+    if (!folder.mkpath(QStringLiteral("."))) {
+        std::fprintf(stderr, "cannot create %s\n", argv[1]);
+        return 1;
+    }
+
+    const QString demoSettings = QDir(test::demoFolder()).filePath(QStringLiteral("demo-settings.ini"));
+    const auto store = openIniSettingsStore(demoSettings);
+    CardWindow window(*store);
+    window.resize(window.sizeHint().expandedTo(QSize(860, 640)));
+    window.show();
+    if (!QTest::qWaitForWindowExposed(&window))
+        return 1;
+
+    bool written = save(&window, folder, QStringLiteral("main-window"));
+    const QStringList tabNames = {QStringLiteral("tab-page-setup"), QStringLiteral("tab-titles"),
+                                  QStringLiteral("tab-data"),       QStringLiteral("tab-item-range"),
+                                  QStringLiteral("tab-about"),      QStringLiteral("tab-general")};
+    QTabWidget *tabs = window.card()->tabs();
+    for (int i = 0; i < tabs->count(); ++i) {
+        tabs->setCurrentIndex(i);
+        written = save(&window, folder, tabNames.at(i)) && written;
+    }
+    return written ? 0 : 1;
+}

@@ -1,0 +1,11 @@
+#include "testutil/TestMain.h"
+
+#include <QApplication>
+
+ZORBIN_DECLARE_TEST(MainCardTest)
+ZORBIN_DECLARE_TEST(CardWindowTest)
+
+ZORBIN_TEST_MAIN_BEGIN(QApplication)
+ZORBIN_TEST_ADD(MainCardTest)
+ZORBIN_TEST_ADD(CardWindowTest)
+ZORBIN_TEST_MAIN_END

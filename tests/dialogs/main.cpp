@@ -1,0 +1,9 @@
+#include "testutil/TestMain.h"
+
+#include <QApplication>
+
+ZORBIN_DECLARE_TEST(CellLineEditorTest)
+
+ZORBIN_TEST_MAIN_BEGIN(QApplication)
+ZORBIN_TEST_ADD(CellLineEditorTest)
+ZORBIN_TEST_MAIN_END
