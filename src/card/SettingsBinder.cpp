@@ -1,5 +1,7 @@
 #include "card/SettingsBinder.h"
 
+#include "card/tabs/TabBuilding.h"
+
 #include <QButtonGroup>
 #include <QCheckBox>
 #include <QComboBox>
@@ -76,6 +78,7 @@ void SettingsBinder::text(QLineEdit *box, QString &value, int maxLength)
 void SettingsBinder::number(QLineEdit *box, QString &value, int maxLength, NumericSetting setting)
 {
     text(box, value, maxLength);
+    tabs::fitToCharacters(box, maxLength, QLatin1Char('0'));
     box->setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("\\d*")), box));
     box->setInputMethodHints(Qt::ImhDigitsOnly);
     auto check = [box, setting] { markProblem(box, numericSettingProblem(setting, box->text())); };

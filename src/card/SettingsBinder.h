@@ -30,7 +30,7 @@ public:
     // A text box; `maxLength` limits typing (0 for no limit). A longer text from the store is
     // kept in the record until the user edits the box.
     void text(QLineEdit *box, QString &value, int maxLength = 0);
-    // A text box for a number: digits only while typing, and a value the runs cannot use is
+    // A text box for a number, as wide as its entry limit: digits only while typing, and a value the runs cannot use is
     // marked at once with the sentence that says what to type (tool tip and red text).
     void number(QLineEdit *box, QString &value, int maxLength, NumericSetting setting);
     void check(QCheckBox *box, CheckValue &value);

@@ -4,8 +4,10 @@
 
 ZORBIN_DECLARE_TEST(MainCardTest)
 ZORBIN_DECLARE_TEST(CardWindowTest)
+ZORBIN_DECLARE_TEST(SettingsValidationTest)
 
 ZORBIN_TEST_MAIN_BEGIN(QApplication)
 ZORBIN_TEST_ADD(MainCardTest)
 ZORBIN_TEST_ADD(CardWindowTest)
+ZORBIN_TEST_ADD(SettingsValidationTest)
 ZORBIN_TEST_MAIN_END

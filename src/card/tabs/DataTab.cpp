@@ -130,10 +130,10 @@ QWidget *DataTab::buildPictures()
     auto *grid = new QGridLayout(group);
     grid->addWidget(options[0], 0, 0, 1, 4);
     grid->addWidget(options[1], 1, 0, 1, 4);
-    grid->addWidget(captionFor(QStringLiteral("מחיצת תמונות:"), folder, group), 2, 1);
-    grid->addWidget(folderField, 2, 2);
-    grid->addWidget(captionFor(QStringLiteral("סיומת:"), extension, group), 3, 1);
-    grid->addWidget(extension, 3, 2, Qt::AlignRight | Qt::AlignAbsolute);  // beside its caption
+    tabs::addFieldRow(grid, 2, QStringLiteral("מחיצת תמונות:"), folder, folderField, {}, 1);
+    // A left-to-right box is put beside its caption in absolute terms.
+    tabs::addFieldRow(grid, 3, QStringLiteral("סיומת:"), extension, nullptr,
+                      Qt::AlignRight | Qt::AlignAbsolute, 1);
     grid->addWidget(options[2], 4, 0, 1, 4);
     grid->addWidget(note, 5, 2, Qt::AlignLeading);
     grid->setColumnMinimumWidth(0, 16);

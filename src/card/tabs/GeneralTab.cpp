@@ -15,7 +15,6 @@
 
 namespace zorbin {
 
-using tabs::captionFor;
 using tabs::named;
 
 GeneralTab::GeneralTab(CardContext &context, QWidget *parent) : QWidget(parent), m_context(context)
@@ -30,8 +29,7 @@ GeneralTab::GeneralTab(CardContext &context, QWidget *parent) : QWidget(parent),
         new FolderField(folder, QStringLiteral("cmdPagingPath"), QStringLiteral("בחירת מחיצת היעד לקטלוג"),
                         false, context, outputGroup);
     auto *outputLayout = new QGridLayout(outputGroup);
-    outputLayout->addWidget(captionFor(QStringLiteral("מחיצת יעד לקטלוג:"), folder, outputGroup), 0, 0);
-    outputLayout->addWidget(folderField, 0, 1);
+    tabs::addFieldRow(outputLayout, 0, QStringLiteral("מחיצת יעד לקטלוג:"), folder, folderField);
     outputLayout->setColumnStretch(1, 1);
 
     auto *sourceGroup = new QGroupBox(QStringLiteral("מקור הנתונים"), this);

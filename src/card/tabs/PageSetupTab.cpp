@@ -53,18 +53,12 @@ QWidget *PageSetupTab::buildPage()
     bind.choice(split, settings.cmbPageSplit);
     bind.choice(location, settings.cmbPicLocation);
     bind.check(rules, settings.chkRules);
-    tabs::fitToCharacters(rows, MaxLengthGridSize);
-    tabs::fitToCharacters(cols, MaxLengthGridSize);
 
     auto *grid = new QGridLayout(group);
-    grid->addWidget(captionFor(QStringLiteral("שורות:"), rows, group), 0, 0);
-    grid->addWidget(rows, 0, 1, Qt::AlignLeading);
-    grid->addWidget(captionFor(QStringLiteral("עמודות:"), cols, group), 1, 0);
-    grid->addWidget(cols, 1, 1, Qt::AlignLeading);
-    grid->addWidget(captionFor(QStringLiteral("קבצים:"), split, group), 2, 0);
-    grid->addWidget(split, 2, 1);
-    grid->addWidget(captionFor(QStringLiteral("מיקום התמונה:"), location, group), 3, 0);
-    grid->addWidget(location, 3, 1);
+    tabs::addFieldRow(grid, 0, QStringLiteral("שורות:"), rows, nullptr, Qt::AlignLeading);
+    tabs::addFieldRow(grid, 1, QStringLiteral("עמודות:"), cols, nullptr, Qt::AlignLeading);
+    tabs::addFieldRow(grid, 2, QStringLiteral("קבצים:"), split);
+    tabs::addFieldRow(grid, 3, QStringLiteral("מיקום התמונה:"), location);
     grid->addWidget(rules, 4, 0, 1, 2);
     return group;
 }
@@ -77,8 +71,6 @@ QWidget *PageSetupTab::buildPictureSize()
     auto *width = named<QLineEdit>(QStringLiteral("txtImageW"), group);
     m_context.binder.number(height, settings.txtImageH, MaxLengthPictureSize, NumericSetting::ImageH);
     m_context.binder.number(width, settings.txtImageW, MaxLengthPictureSize, NumericSetting::ImageW);
-    tabs::fitToCharacters(height, MaxLengthPictureSize);
-    tabs::fitToCharacters(width, MaxLengthPictureSize);
     height->setPlaceholderText(QStringLiteral("ללא"));
     width->setPlaceholderText(QStringLiteral("ללא"));
     auto *layout = new QHBoxLayout(group);

@@ -1,5 +1,6 @@
 #include "card/tabs/TabBuilding.h"
 
+#include <QGridLayout>
 #include <QLineEdit>
 
 namespace zorbin::tabs {
@@ -11,6 +12,13 @@ QLabel *captionFor(const QString &text, QWidget *field, QWidget *parent)
     if (field->accessibleName().isEmpty())
         field->setAccessibleName(QString(text).remove(QLatin1Char(':')));
     return caption;
+}
+
+void addFieldRow(QGridLayout *grid, int row, const QString &caption, QWidget *field, QWidget *shown,
+                 Qt::Alignment alignment, int column)
+{
+    grid->addWidget(captionFor(caption, field, grid->parentWidget()), row, column);
+    grid->addWidget(shown ? shown : field, row, column + 1, alignment);
 }
 
 void fitToCharacters(QLineEdit *box, int characters, QChar sample)

@@ -22,6 +22,12 @@ template <typename Widget, typename... Args> Widget *named(const QString &object
 // field's accessible name too.
 QLabel *captionFor(const QString &text, QWidget *field, QWidget *parent);
 
+// Puts a caption and its field side by side on a row of `grid`: the caption in `column`, the
+// field in the next one. `shown`, when given, is the widget that holds the field (a box with
+// its button) and takes the field's place in the grid.
+void addFieldRow(QGridLayout *grid, int row, const QString &caption, QWidget *field, QWidget *shown = nullptr,
+                 Qt::Alignment alignment = {}, int column = 0);
+
 // A text box wide enough for `characters` characters like `sample` (the box's entry limit).
 void fitToCharacters(QLineEdit *box, int characters, QChar sample = QLatin1Char('W'));
 

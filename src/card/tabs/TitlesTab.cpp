@@ -18,7 +18,6 @@
 
 namespace zorbin {
 
-using tabs::captionFor;
 using tabs::named;
 
 namespace {
@@ -60,19 +59,17 @@ QWidget *TitlesTab::buildTitles()
     connect(m_txtLogo, &QLineEdit::textChanged, this, &TitlesTab::showLogo);
     showLogo();
 
-    auto *logoRow = new QHBoxLayout;
+    auto *logo = new QWidget(group);
+    auto *logoRow = new QHBoxLayout(logo);
+    logoRow->setContentsMargins(0, 0, 0, 0);
     logoRow->addWidget(m_txtLogo, 1);
     logoRow->addWidget(m_imgLogo);
 
     auto *grid = new QGridLayout(group);
-    grid->addWidget(captionFor(QStringLiteral("כותרת עליונה:"), top, group), 0, 0);
-    grid->addWidget(top, 0, 1);
-    grid->addWidget(captionFor(QStringLiteral("כותרת עליונה משנית:"), second, group), 1, 0);
-    grid->addWidget(second, 1, 1);
-    grid->addWidget(captionFor(QStringLiteral("כותרת תחתונה:"), bottom, group), 2, 0);
-    grid->addWidget(bottom, 2, 1);
-    grid->addWidget(captionFor(QStringLiteral("סמל (לוגו):"), m_txtLogo, group), 3, 0);
-    grid->addLayout(logoRow, 3, 1);
+    tabs::addFieldRow(grid, 0, QStringLiteral("כותרת עליונה:"), top);
+    tabs::addFieldRow(grid, 1, QStringLiteral("כותרת עליונה משנית:"), second);
+    tabs::addFieldRow(grid, 2, QStringLiteral("כותרת תחתונה:"), bottom);
+    tabs::addFieldRow(grid, 3, QStringLiteral("סמל (לוגו):"), m_txtLogo, logo);
     grid->setColumnStretch(1, 1);
     return group;
 }
@@ -86,15 +83,11 @@ QWidget *TitlesTab::buildBands()
     m_context.binder.number(top, settings.txtTopPercent, MaxLengthPercent, NumericSetting::TopPercent);
     m_context.binder.number(bottom, settings.txtBottomPercent, MaxLengthPercent,
                             NumericSetting::BottomPercent);
-    tabs::fitToCharacters(top, MaxLengthPercent);
-    tabs::fitToCharacters(bottom, MaxLengthPercent);
 
     auto *grid = new QGridLayout(group);
-    grid->addWidget(captionFor(QStringLiteral("גובה הכותרת העליונה:"), top, group), 0, 0);
-    grid->addWidget(top, 0, 1);
+    tabs::addFieldRow(grid, 0, QStringLiteral("גובה הכותרת העליונה:"), top);
     grid->addWidget(new QLabel(QStringLiteral("אחוז מהעמוד"), group), 0, 2);
-    grid->addWidget(captionFor(QStringLiteral("גובה הכותרת התחתונה:"), bottom, group), 1, 0);
-    grid->addWidget(bottom, 1, 1);
+    tabs::addFieldRow(grid, 1, QStringLiteral("גובה הכותרת התחתונה:"), bottom);
     grid->addWidget(new QLabel(QStringLiteral("אחוז מהעמוד"), group), 1, 2);
     grid->setColumnStretch(3, 1);
     return group;
