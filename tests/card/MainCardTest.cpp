@@ -3,8 +3,11 @@
 #include "control/ProgressMeter.h"
 #include "control/UserPort.h"
 #include "dialogs/CellLineEditor.h"
+#include "dialogs/ItemListModel.h"
+#include "dialogs/SelectItemDialog.h"
 #include "tests/card/CardRig.h"
 #include "testutil/TestMain.h"
+#include "testutil/WorkDatabaseFixture.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -366,6 +369,66 @@ private Q_SLOTS:
         rig.files.answer = std::nullopt;
         rig.find<QAbstractButton>(QStringLiteral("cmdPagingPath"))->click();
         QCOMPARE(rig.card->control().settings().txtPagingPath, QStringLiteral("/srv/catalog"));
+    }
+
+    void selectingItemsCollectsFirstThenAsks()
+    {
+        QTemporaryDir folder;
+        const QString workDB = folder.filePath(QStringLiteral("zorbindb.tmp"));
+        WorkRows rows;
+        rows.items = {WorkItem(QStringLiteral("A1")), WorkItem(QStringLiteral("A2"))};
+        QVERIFY(makeWorkDatabase(workDB, rows).isOk());
+        CardRig rig;
+        rig.start();
+        rig.stages->workDBFile = workDB;
+        auto *select = rig.find<QPushButton>(QStringLiteral("cmdSelectAccount"));
+        auto *useMarked = rig.find<QCheckBox>(QStringLiteral("ChkSelectAccount"));
+        ModalAnswerer answerer;
+        QStringList dialogs;
+        answerer.onDialog = [&dialogs](QDialog *dialog) {
+            auto *items = qobject_cast<frmSelectItem *>(dialog);
+            dialogs << QStringLiteral("%1:%2")
+                           .arg(dialog->objectName())
+                           .arg(items ? items->model()->rowCount() : -1);
+            dialog->accept();
+        };
+
+        // The first time there is nothing collected yet: collect without asking.
+        select->click();
+        QVERIFY(answerer.texts.isEmpty());
+        QCOMPARE(rig.stages->names().count(QStringLiteral("BuildAndCollectData")), 1);
+        QVERIFY(useMarked->isChecked());
+        QCOMPARE(dialogs, QStringList{QStringLiteral("frmSelectItem:2")});
+
+        // Then the user is asked; No keeps the working database and its marks.
+        answerer.buttons = {QMessageBox::No};
+        select->click();
+        QCOMPARE(answerer.texts, QStringList{QStringLiteral("לסרוק מחדש את רשימת הפריטים?")});
+        QCOMPARE(answerer.titles, QStringList{QStringLiteral("שימו לב")});
+        QCOMPARE(rig.stages->names().count(QStringLiteral("BuildAndCollectData")), 1);
+        answerer.buttons = {QMessageBox::Yes};
+        select->click();
+        QCOMPARE(rig.stages->names().count(QStringLiteral("BuildAndCollectData")), 2);
+        QCOMPARE(dialogs.size(), 3);
+    }
+
+    void theConnectionButtonOpensTheConnectionDialog()
+    {
+        CardRig rig;
+        rig.start();
+        rig.card->control().connection().server = QStringLiteral("srv-7");
+        ModalAnswerer answerer;
+        QString shownServer;
+        QString title;
+        answerer.onDialog = [&](QDialog *dialog) {
+            title = dialog->windowTitle();
+            if (auto *server = dialog->findChild<QLineEdit *>(QStringLiteral("txtConnServer")))
+                shownServer = server->text();
+            dialog->reject();
+        };
+        rig.find<QPushButton>(QStringLiteral("CmdConnect"))->click();
+        QCOMPARE(title, QStringLiteral("הגדרות התחברות לויזקאונט חלונות"));
+        QCOMPARE(shownServer, QStringLiteral("srv-7"));
     }
 
     void bringingThePageTabForwardClearsTheSelectedLine()

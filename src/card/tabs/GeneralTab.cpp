@@ -5,6 +5,7 @@
 #include "card/SettingsBinder.h"
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
+#include "dialogs/LogonDialog.h"
 
 #include <QGridLayout>
 #include <QGroupBox>
@@ -48,7 +49,9 @@ GeneralTab::GeneralTab(CardContext &context, QWidget *parent) : QWidget(parent),
 
 void GeneralTab::CmdConnect_Click()
 {
-    // The connection dialog arrives with the accounting-database access.
+    // The dialog starts from the control's parameters each time; OK replaces and saves them.
+    frmLogon dialog(m_context.control.store(), m_context.control.connection(), window());
+    dialog.exec();
 }
 
 } // namespace zorbin
