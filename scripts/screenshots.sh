@@ -6,4 +6,7 @@ cd "$(dirname "$0")/.."
 build_dir=${BUILD_DIR:-build}
 scripts/build.sh >/dev/null
 cmake --build "$build_dir" --target card-screenshots >/dev/null
-xvfb-run -a -s "-screen 0 1280x900x24" "$build_dir/tests/card/card-screenshots" docs/screenshots
+# The item selection picture collects the demo items: into a working database of its own.
+work_dir=$(mktemp -d)
+trap 'rm -rf "$work_dir"' EXIT
+TMPDIR=$work_dir xvfb-run -a -s "-screen 0 1280x900x24" "$build_dir/tests/card/card-screenshots" docs/screenshots

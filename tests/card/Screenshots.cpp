@@ -1,15 +1,20 @@
 // card-screenshots: pictures of the desktop program for the documentation. Run it under a
 // display (scripts/screenshots.sh starts a virtual one): it opens the main window on the demo
 // database's settings, grabs each tab and the dialogs, and writes PNG files into the folder
-// given as its one argument.
+// given as its one argument. The collection for the selection dialog writes the working database
+// into the temporary folder (TMPDIR), as every run does.
 #include "card/CardWindow.h"
 #include "card/MainCard.h"
+#include "dialogs/ItemListModel.h"
+#include "dialogs/LogonDialog.h"
+#include "dialogs/SelectItemDialog.h"
 #include "platform/SettingsStore.h"
 #include "testutil/TestFiles.h"
 
 #include <QApplication>
 #include <QDir>
 #include <QTabWidget>
+#include <QTableView>
 #include <QTest>
 #include <cstdio>
 
@@ -63,6 +68,27 @@ int main(int argc, char *argv[])
     for (int i = 0; i < tabs->count(); ++i) {
         tabs->setCurrentIndex(i);
         written = save(&window, folder, tabNames.at(i)) && written;
+    }
+
+    {
+        CatalogControl &control = window.card()->control();
+        frmLogon connection(control.store(), control.connection(), &window);
+        connection.show();
+        written = save(&connection, folder, QStringLiteral("connection-dialog")) && written;
+    }
+    {
+        // The item selection dialog as a user leaves it: the items collected, a few unmarked.
+        CatalogControl &control = window.card()->control();
+        if (const Status collected = control.collect(); !collected)
+            std::fprintf(stderr, "collecting the demo items: %s\n", qPrintable(collected.description()));
+        frmSelectItem selection(control.runState().WorkDBFile, &window);
+        ItemListModel *items = selection.model();
+        for (int row = 1; row < items->rowCount() && row <= 5; row += 2)
+            items->setData(items->index(row, ItemListModel::IncludeColumn), Qt::Unchecked,
+                           Qt::CheckStateRole);
+        selection.show();
+        selection.grid()->setCurrentIndex(items->index(0, ItemListModel::KeyColumn));
+        written = save(&selection, folder, QStringLiteral("item-selection")) && written;
     }
     return written ? 0 : 1;
 }
