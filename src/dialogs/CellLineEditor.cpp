@@ -196,6 +196,10 @@ void CellLineEditor::showLine(int index)
 void CellLineEditor::select(int index)
 {
     m_selectedLine = static_cast<std::int16_t>(index);
+    // With no line selected the name box says how to select one.
+    m_lblCellName->setToolTip(index < 0 ? QStringLiteral("לחיצה על שורה משמאל בוחרת אותה לעיצוב")
+                                        : QString());
+    m_lblCellName->setEnabled(index >= 0);
     for (int i = 0; i < CellLineCount; ++i)
         m_slots[static_cast<std::size_t>(i)]->setSelected(i == index);
     m_cmdSetLabDef->setEnabled(index >= 0);

@@ -100,8 +100,8 @@ QVariant ItemListModel::data(const QModelIndex &index, int role) const
 
 QVariant ItemListModel::headerData(int section, Qt::Orientation orientation, int role) const
 {
-    if (orientation != Qt::Horizontal)
-        return QAbstractTableModel::headerData(section, orientation, role);
+    if (orientation != Qt::Horizontal) // the row-header column is a plain margin, without numbers
+        return role == Qt::DisplayRole ? QVariant(QString()) : QVariant();
     if (role == Qt::TextAlignmentRole)
         return QVariant::fromValue(Qt::AlignRight | Qt::AlignVCenter);
     if (role != Qt::DisplayRole)

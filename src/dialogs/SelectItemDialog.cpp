@@ -11,6 +11,7 @@
 #include <QPushButton>
 #include <QTableView>
 #include <QVBoxLayout>
+#include <algorithm>
 
 namespace zorbin {
 namespace {
@@ -126,10 +127,12 @@ QWidget *frmSelectItem::buildSearch(const QString &frameName, const QString &but
 
 void frmSelectItem::fitColumns()
 {
-    m_VSSelectItems->resizeColumnToContents(ItemListModel::IncludeColumn);
-    const int least = designWidth(645, this);
-    if (m_VSSelectItems->columnWidth(ItemListModel::IncludeColumn) < least)
-        m_VSSelectItems->setColumnWidth(ItemListModel::IncludeColumn, least);
+    // The mark column follows its heading and its check box; the name column takes the rest.
+    QHeaderView *headings = m_VSSelectItems->horizontalHeader();
+    headings->setMinimumSectionSize(designWidth(645, this));
+    headings->setSectionResizeMode(ItemListModel::IncludeColumn, QHeaderView::ResizeToContents);
+    headings->setSectionResizeMode(ItemListModel::NameColumn, QHeaderView::Stretch);
+    headings->setStretchLastSection(false);
 }
 
 void frmSelectItem::showOutcome(const Status &status)
@@ -174,13 +177,11 @@ void frmSelectItem::cmdFindByDesc_Click()
 void frmSelectItem::cmdShowMarked_Click()
 {
     showOutcome(m_model->reload(true));
-    fitColumns();
 }
 
 void frmSelectItem::cmdShowAll_Click()
 {
     showOutcome(m_model->reload(false));
-    fitColumns();
 }
 
 void frmSelectItem::cmdClose_Click()

@@ -73,6 +73,8 @@ int main(int argc, char *argv[])
     {
         CatalogControl &control = window.card()->control();
         frmLogon connection(control.store(), control.connection(), &window);
+        connection.resize(
+            connection.sizeHint().expandedTo(QSize(520, 0))); // as the connection button opens it
         connection.show();
         written = save(&connection, folder, QStringLiteral("connection-dialog")) && written;
     }

@@ -51,6 +51,8 @@ void GeneralTab::CmdConnect_Click()
 {
     // The dialog starts from the control's parameters each time; OK replaces and saves them.
     frmLogon dialog(m_context.control.store(), m_context.control.connection(), window());
+    // Wide enough for a server folder or a database file name of some length.
+    dialog.resize(dialog.sizeHint().expandedTo(QSize(520, 0)));
     dialog.exec();
 }
 
