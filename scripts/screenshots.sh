@@ -6,7 +6,12 @@ cd "$(dirname "$0")/.."
 build_dir=${BUILD_DIR:-build}
 scripts/build.sh >/dev/null
 cmake --build "$build_dir" --target card-screenshots >/dev/null
-# The item selection picture collects the demo items: into a working database of its own.
+# A demo database in a short, plain folder, so that the paths in the pictures read well; the
+# item selection picture collects its items into a working database of its own.
+demo_dir=/tmp/zorbin-demo
 work_dir=$(mktemp -d)
-trap 'rm -rf "$work_dir"' EXIT
-TMPDIR=$work_dir xvfb-run -a -s "-screen 0 1280x900x24" "$build_dir/tests/card/card-screenshots" docs/screenshots
+trap 'rm -rf "$work_dir" "$demo_dir"' EXIT
+rm -rf "$demo_dir"
+bash demo/make-demo-db.sh "$demo_dir" >/dev/null
+TMPDIR=$work_dir xvfb-run -a -s "-screen 0 1280x900x24" "$build_dir/tests/card/card-screenshots" \
+    docs/screenshots "$demo_dir/demo-settings.ini"

@@ -8,6 +8,7 @@
 #include <QLineEdit>
 #include <QRadioButton>
 #include <QRegularExpressionValidator>
+#include <algorithm>
 
 namespace zorbin {
 namespace {
@@ -62,17 +63,20 @@ void SettingsBinder::showing(const std::function<void()> &change)
 
 void SettingsBinder::text(QLineEdit *box, QString &value, int maxLength)
 {
-    if (maxLength > 0)
-        box->setMaxLength(maxLength);
-    box->setText(value);
+    // A stored text longer than the limit (written by hand, or by an older version) is shown
+    // whole rather than cut: the run uses what the user sees, and a save keeps it.
+    auto show = [box, &value, maxLength] {
+        if (maxLength > 0)
+            box->setMaxLength(std::max(maxLength, static_cast<int>(value.size())));
+        if (box->text() != value)
+            box->setText(value);
+    };
+    show();
     connect(box, &QLineEdit::textChanged, this, [this, &value](const QString &typed) {
         if (!m_showing)
             value = typed;
     });
-    m_refreshers.push_back([this, box, &value] {
-        if (box->text() != value)
-            showing([&] { box->setText(value); });
-    });
+    m_refreshers.push_back([this, show] { showing(show); });
 }
 
 void SettingsBinder::number(QLineEdit *box, QString &value, int maxLength, NumericSetting setting)

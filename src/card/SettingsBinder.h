@@ -27,8 +27,8 @@ class SettingsBinder : public QObject
 public:
     explicit SettingsBinder(QObject *parent = nullptr);
 
-    // A text box; `maxLength` limits typing (0 for no limit). A longer text from the store is
-    // kept in the record until the user edits the box.
+    // A text box; `maxLength` limits typing (0 for no limit). A longer stored text is shown
+    // whole, and the limit then allows its length.
     void text(QLineEdit *box, QString &value, int maxLength = 0);
     // A text box for a number, as wide as its entry limit: digits only while typing, and a value the runs cannot use is
     // marked at once with the sentence that says what to type (tool tip and red text).

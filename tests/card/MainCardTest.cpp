@@ -139,6 +139,20 @@ private Q_SLOTS:
         QCOMPARE(box->text().size(), limit);
     }
 
+    void aLongerStoredTextIsShownWholeAndKept()
+    {
+        CardRig rig;
+        const QString longBound = QStringLiteral("ABCDEFGHIJKLMNOPQRST"); // 20 characters; typing allows 15
+        rig.store.set(QStringLiteral("ToSort"), longBound);
+        rig.start();
+        auto *box = rig.find<QLineEdit>(QStringLiteral("txtToSort"));
+        QCOMPARE(box->text(), longBound);
+        rig.find<QPushButton>(QStringLiteral("CmdDef"))->click();
+        QCOMPARE(rig.store.get(QStringLiteral("ToSort")), longBound);
+        QTest::keyClicks(box, QStringLiteral("UVW"));
+        QCOMPARE(box->text(), longBound); // no longer than it already is
+    }
+
     void storedSettingsShowAndEditsSaveBack()
     {
         CardRig rig;

@@ -1,8 +1,8 @@
 // card-screenshots: pictures of the desktop program for the documentation. Run it under a
 // display (scripts/screenshots.sh starts a virtual one): it opens the main window on the demo
-// database's settings, grabs each tab and the dialogs, and writes PNG files into the folder
-// given as its one argument. The collection for the selection dialog writes the working database
-// into the temporary folder (TMPDIR), as every run does.
+// database's settings (the build's demo, or the settings file given as the second argument), grabs each tab
+// and the dialogs, and writes PNG files into the folder given as its one argument. The collection for the
+// selection dialog writes the working database into the temporary folder (TMPDIR), as every run does.
 #include "card/CardWindow.h"
 #include "card/MainCard.h"
 #include "dialogs/ItemListModel.h"
@@ -42,8 +42,8 @@ int main(int argc, char *argv[])
     QApplication::setApplicationName(QStringLiteral("Zorbin"));
     QApplication::setApplicationDisplayName(QStringLiteral("זורבין"));
     QApplication::setLayoutDirection(Qt::RightToLeft);
-    if (argc != 2) {
-        std::fprintf(stderr, "usage: card-screenshots FOLDER\n");
+    if (argc != 2 && argc != 3) {
+        std::fprintf(stderr, "usage: card-screenshots FOLDER [SETTINGS.ini]\n");
         return 2;
     }
     const QDir folder(QString::fromLocal8Bit(argv[1]));
@@ -52,7 +52,9 @@ int main(int argc, char *argv[])
         return 1;
     }
 
-    const QString demoSettings = QDir(test::demoFolder()).filePath(QStringLiteral("demo-settings.ini"));
+    const QString demoSettings = argc == 3
+                                     ? QString::fromLocal8Bit(argv[2])
+                                     : QDir(test::demoFolder()).filePath(QStringLiteral("demo-settings.ini"));
     const auto store = openIniSettingsStore(demoSettings);
     CardWindow window(*store);
     window.resize(window.sizeHint().expandedTo(QSize(860, 640)));
