@@ -20,13 +20,27 @@ Status nothingChosen(const QString &what)
                              .arg(what));
 }
 
+// A price list or extra note that the run collects when its check box is ticked.
 struct ChosenList
 {
     CheckValue CatalogSettings::*use;
     ChoiceList CatalogSettings::*list;
+    void (*fill)(RunContext &, const QString &, std::int16_t, std::int32_t);
     std::int16_t digit;
     const char16_t *status;
     const char16_t *name;
+};
+
+// In the order of the run, which does not depend on the settings.
+const ChosenList ChosenLists[] = {
+    {&CatalogSettings::chkUsePriceField, &CatalogSettings::cmbPriceField, &FillDBItemPrice, 1,
+     u"סורק מחירון ראשי", u"מחירון ראשי"},
+    {&CatalogSettings::ChkUsePriceField2, &CatalogSettings::cmbPriceField2, &FillDBItemPrice, 2,
+     u"סורק מחירון משני", u"מחירון משני"},
+    {&CatalogSettings::ChkUseExtraNote1, &CatalogSettings::cmbExtraNote1, &FillDBItemExtraNote, 1,
+     u"סורק נתון נוסף 1", u"נתון נוסף 1"},
+    {&CatalogSettings::ChkUseExtraNote2, &CatalogSettings::cmbExtraNote2, &FillDBItemExtraNote, 2,
+     u"סורק נתון נוסף 2", u"נתון נוסף 2"},
 };
 
 } // namespace
@@ -53,37 +67,14 @@ Status BuildAndCollectData(RunContext &context)
     if (state.CollectFailed)
         return Status::ok();
 
-    static const ChosenList prices[] = {
-        {&CatalogSettings::chkUsePriceField, &CatalogSettings::cmbPriceField, 1, u"סורק מחירון ראשי",
-         u"מחירון ראשי"},
-        {&CatalogSettings::ChkUsePriceField2, &CatalogSettings::cmbPriceField2, 2, u"סורק מחירון משני",
-         u"מחירון משני"},
-    };
-    static const ChosenList notes[] = {
-        {&CatalogSettings::ChkUseExtraNote1, &CatalogSettings::cmbExtraNote1, 1, u"סורק נתון נוסף 1",
-         u"נתון נוסף 1"},
-        {&CatalogSettings::ChkUseExtraNote2, &CatalogSettings::cmbExtraNote2, 2, u"סורק נתון נוסף 2",
-         u"נתון נוסף 2"},
-    };
-    for (const ChosenList &price : prices) {
-        if (!isTicked(settings.*price.use))
+    for (const ChosenList &chosen : ChosenLists) {
+        if (!isTicked(settings.*chosen.use))
             continue;
-        context.user.showStatus(QString::fromUtf16(price.status));
-        const std::optional<std::int32_t> listId = (settings.*price.list).currentItemData();
-        if (!listId)
-            return nothingChosen(QString::fromUtf16(price.name));
-        FillDBItemPrice(context, state.WorkDBFile, price.digit, *listId);
-        if (state.CollectFailed)
-            return Status::ok();
-    }
-    for (const ChosenList &note : notes) {
-        if (!isTicked(settings.*note.use))
-            continue;
-        context.user.showStatus(QString::fromUtf16(note.status));
-        const std::optional<std::int32_t> noteId = (settings.*note.list).currentItemData();
-        if (!noteId)
-            return nothingChosen(QString::fromUtf16(note.name));
-        FillDBItemExtraNote(context, state.WorkDBFile, note.digit, *noteId);
+        context.user.showStatus(QString::fromUtf16(chosen.status));
+        const std::optional<std::int32_t> number = (settings.*chosen.list).currentItemData();
+        if (!number)
+            return nothingChosen(QString::fromUtf16(chosen.name));
+        chosen.fill(context, state.WorkDBFile, chosen.digit, *number);
         if (state.CollectFailed)
             return Status::ok();
     }

@@ -76,30 +76,34 @@ void FillDBItem7(RunContext &context, const QString &pDBFile)
     runCopyLoop(context, pDBFile, plan);
 }
 
+namespace {
+
+// The price and note steps: a table of items' keys and their values, named by its digit.
+void fillKeyedTable(RunContext &context, const QString &pDBFile, const Result<QString> &statement,
+                    const QString &table, std::vector<CopiedColumn> values)
+{
+    if (!statement)
+        return reportCollectFault(context, statement.status().description());
+    values.insert(values.begin(), keyText());
+    runCopyLoop(context, pDBFile, CopyPlan{statement.value(), table, std::move(values), true});
+}
+
+} // namespace
+
 void FillDBItemPrice(RunContext &context, const QString &pDBFile, std::int16_t pPriceID,
                      std::int32_t pPriceListID)
 {
-    Result<QString> statement = buildPriceStatement(context.settings, pPriceListID);
-    if (!statement)
-        return reportCollectFault(context, statement.status().description());
-    CopyPlan plan{statement.value(),
-                  QStringLiteral("tItemPrice") + QString::number(pPriceID),
-                  {keyText(), textOr("Coin", "CurrencyCode", Shekel), asRead("Price", "Price")},
-                  true};
-    runCopyLoop(context, pDBFile, plan);
+    fillKeyedTable(context, pDBFile, buildPriceStatement(context.settings, pPriceListID),
+                   QStringLiteral("tItemPrice") + QString::number(pPriceID),
+                   {textOr("Coin", "CurrencyCode", Shekel), asRead("Price", "Price")});
 }
 
 void FillDBItemExtraNote(RunContext &context, const QString &pDBFile, std::int16_t pNoteFieldID,
                          std::int32_t pExtraNoteID)
 {
-    Result<QString> statement = buildExtraNoteStatement(context.settings, pExtraNoteID);
-    if (!statement)
-        return reportCollectFault(context, statement.status().description());
-    CopyPlan plan{statement.value(),
-                  QStringLiteral("tExtraNote") + QString::number(pNoteFieldID),
-                  {keyText(), textOr("ExtraNote", "Note", MissingText)},
-                  true};
-    runCopyLoop(context, pDBFile, plan);
+    fillKeyedTable(context, pDBFile, buildExtraNoteStatement(context.settings, pExtraNoteID),
+                   QStringLiteral("tExtraNote") + QString::number(pNoteFieldID),
+                   {textOr("ExtraNote", "Note", MissingText)});
 }
 
 void FillDBItemSort7(RunContext &context, const QString &pDBFile)
