@@ -4,13 +4,13 @@
 #include "control/RunContext.h"
 #include "control/RunState.h"
 #include "control/UserPort.h"
+#include "source/ConnectionParams.h"
 #include "source/ConnectionString.h"
 #include "workdb/RowWriter.h"
 #include "workdb/SourceReadAhead.h"
 #include "workdb/WorkDatabase.h"
 
 #include <algorithm>
-#include <iterator>
 
 namespace zorbin {
 namespace {
@@ -50,9 +50,10 @@ SourceColumns sourceColumns(const CopyPlan &plan)
 
 // Makes a target row from a source row on the reading thread. In the item loop a row whose key
 // reads as the empty text is passed over: it is marked by a Null first value (ItemKey).
-SourceReadAhead::Shaper shaperFor(const CopyPlan &plan, const SourceColumns &columns)
+// `encode`: whether the texts are encoded here or when they are written (WorkValue::from).
+SourceReadAhead::Shaper shaperFor(const CopyPlan &plan, const SourceColumns &columns, bool encode)
 {
-    return [&plan, &columns](std::span<const QVariant> read, std::span<WorkValue> row) {
+    return [&plan, &columns, encode](std::span<const QVariant> read, std::span<WorkValue> row) {
         const QString key = plan.itemLoop ? read[0].toString() : QString();
         if (plan.itemLoop && key.isEmpty())
             return;
@@ -63,7 +64,7 @@ SourceReadAhead::Shaper shaperFor(const CopyPlan &plan, const SourceColumns &col
                 continue;
             const int position = columns.positions[i];
             const QVariant &value = position >= 0 ? read[static_cast<std::size_t>(position)] : none;
-            row[i] = WorkValue::from(column.convert ? column.convert(value, key) : value);
+            row[i] = WorkValue::from(column.convert ? column.convert(value, key) : value, encode);
         }
     };
 }
@@ -97,7 +98,11 @@ void reportCollectFault(RunContext &context, const QString &description)
 void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan)
 {
     const SourceColumns columns = sourceColumns(plan);
-    const SourceReadAhead::Shaper shaper = shaperFor(plan, columns);
+    // Encoding the texts is the costly part of shaping a row. A database file is read faster
+    // than the working database is written, so the reading thread has time for it; an ODBC
+    // driver reads slower, and there the step's thread encodes while it writes.
+    const bool encodeWhileReading = context.connection.type == FileConnection;
+    const SourceReadAhead::Shaper shaper = shaperFor(plan, columns, encodeWhileReading);
     SourceReadAhead source(BuildConnString(context.connection), plan.statement, columns.names, plan.itemLoop,
                            plan.columns.size(), shaper);
     if (Status running = source.waitUntilRunning(); !running)
@@ -127,14 +132,15 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
                                            [](const CopiedColumn &c) { return c.readsSettings; });
     static_assert(RowWriter::MaxRowsAtOnce >= ProgressMeter::Cadence);
     // Rows are written a few at a time, always before the next progress point, so that a stop
-    // or a refusal leaves the working database as writing them one by one would.
-    std::vector<WorkValue> pending;
-    pending.reserve(RowWriter::MaxRowsAtOnce * plan.columns.size());
+    // or a refusal leaves the working database as writing them one by one would. The rows stay
+    // where the reader put them until they are written.
+    std::vector<RowWriter::Row> pending;
+    pending.reserve(RowWriter::MaxRowsAtOnce);
     auto writePending = [&]() -> Status {
         std::size_t failedRow = 0;
         const WriteOutcome written = writer.writeSkippingDuplicates(pending, &failedRow);
         if (!written)
-            return Status::fault(describeRefusal(written, plan, pending[failedRow * plan.columns.size()]));
+            return Status::fault(describeRefusal(written, plan, pending[failedRow][0]));
         pending.clear();
         return Status::ok();
     };
@@ -145,7 +151,7 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
         if (!plan.itemLoop || !row[0].isNull()) {
             if (readsSettings)
                 completeOnStepThread(plan, row);
-            std::move(row.begin(), row.end(), std::back_inserter(pending));
+            pending.push_back(row);
         }
         ++counter;
         if (counter % ProgressMeter::Cadence != 0)

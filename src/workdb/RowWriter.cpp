@@ -7,12 +7,24 @@
 namespace zorbin {
 namespace {
 
-// Binds one value; a text is bound where it is, so it must stay unchanged until the step.
-int bindValue(sqlite3_stmt *statement, int position, const WorkValue &value)
+// Binds one value. A UTF-8 text is bound where it is, so it must stay unchanged until the
+// step; a UTF-16 text is encoded into `encoded`, which must live as long.
+int bindValue(sqlite3_stmt *statement, int position, const WorkValue &value, QByteArray &encoded)
 {
-    if (const auto *text = std::get_if<QByteArray>(&value.value))
-        return sqlite3_bind_text(statement, position, text->constData(), static_cast<int>(text->size()),
+    const QByteArray *text = std::get_if<QByteArray>(&value.value);
+    if (const auto *unencoded = std::get_if<QString>(&value.value)) {
+        encoded = unencoded->toUtf8();
+        text = &encoded;
+    }
+    if (text) {
+        // A QByteArray ends in a zero byte. Saying so (a length of -1) spares the engine a copy
+        // of the text when the length checks of the table read it; a text with a zero byte of
+        // its own is bound with its length, to be stored whole.
+        const int length = static_cast<int>(text->size());
+        const bool terminated = qstrlen(text->constData()) == static_cast<uint>(length);
+        return sqlite3_bind_text(statement, position, text->constData(), terminated ? -1 : length,
                                  SQLITE_STATIC);
+    }
     if (const auto *whole = std::get_if<std::int64_t>(&value.value))
         return sqlite3_bind_int64(statement, position, *whole);
     if (const auto *real = std::get_if<double>(&value.value))
@@ -59,14 +71,21 @@ sqlite3_stmt *RowWriter::statementFor(std::size_t rows)
     return statement;
 }
 
-WriteOutcome RowWriter::step(sqlite3_stmt *statement, std::span<const WorkValue> values)
+WriteOutcome RowWriter::step(sqlite3_stmt *statement, std::span<const Row> rows)
 {
     if (!statement)
         return WriteOutcome::refused(Refusal::Other, m_prepareError);
-    for (std::size_t i = 0; i < values.size(); ++i) {
-        if (bindValue(statement, static_cast<int>(i + 1), values[i]) != SQLITE_OK)
-            return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
-                                            QString::fromUtf8(sqlite3_errmsg(m_handle)));
+    int position = 0;
+    m_encoded.resize(rows.size() * static_cast<std::size_t>(m_columnCount));
+    for (const Row &row : rows) {
+        Q_ASSERT(row.size() == static_cast<std::size_t>(m_columnCount));
+        for (const WorkValue &value : row) {
+            if (bindValue(statement, position + 1, value, m_encoded[static_cast<std::size_t>(position)]) !=
+                SQLITE_OK)
+                return WriteOutcome::fromEngine(sqlite3_extended_errcode(m_handle),
+                                                QString::fromUtf8(sqlite3_errmsg(m_handle)));
+            ++position;
+        }
     }
     const int rc = sqlite3_step(statement);
     WriteOutcome outcome;
@@ -89,21 +108,19 @@ WriteOutcome RowWriter::write(std::span<const QVariant> values)
 
 WriteOutcome RowWriter::write(std::span<const WorkValue> values)
 {
-    Q_ASSERT(values.size() == static_cast<std::size_t>(m_columnCount));
-    return step(statementFor(1), values);
+    const Row row = values;
+    return step(statementFor(1), std::span<const Row>(&row, 1));
 }
 
-WriteOutcome RowWriter::writeSkippingDuplicates(std::span<const WorkValue> values, std::size_t *failedRow)
+WriteOutcome RowWriter::writeSkippingDuplicates(std::span<const Row> rows, std::size_t *failedRow)
 {
-    const auto width = static_cast<std::size_t>(m_columnCount);
-    const std::size_t rows = values.size() / width;
-    Q_ASSERT(rows * width == values.size() && rows <= MaxRowsAtOnce);
-    if (rows == 0)
+    Q_ASSERT(rows.size() <= MaxRowsAtOnce);
+    if (rows.empty())
         return {};
-    if (rows > 1 && step(statementFor(rows), values))
+    if (rows.size() > 1 && step(statementFor(rows.size()), rows))
         return {};
-    for (std::size_t row = 0; row < rows; ++row) {
-        const WriteOutcome written = step(statementFor(1), values.subspan(row * width, width));
+    for (std::size_t row = 0; row < rows.size(); ++row) {
+        const WriteOutcome written = step(statementFor(1), rows.subspan(row, 1));
         if (!written && !written.isDuplicateKey()) {
             if (failedRow)
                 *failedRow = row;

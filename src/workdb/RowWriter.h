@@ -41,17 +41,18 @@ public:
     WriteOutcome write(std::span<const QVariant> values);
     WriteOutcome write(std::span<const WorkValue> values);
 
-    // Up to MaxRowsAtOnce rows, one after the other in `values`, with the effect of writing them
+    // Up to MaxRowsAtOnce rows, each one value per column, with the effect of writing them
     // one by one and passing over each row the table refuses as a duplicate key: the outcome
     // is the first other refusal, `failedRow` its row, and no row after it is written. One
     // statement writes them all (a fifth of the work per row) unless the engine refuses it;
     // then nothing of it was written and the rows are written one by one.
     static constexpr std::size_t MaxRowsAtOnce = 5;
-    WriteOutcome writeSkippingDuplicates(std::span<const WorkValue> values, std::size_t *failedRow);
+    using Row = std::span<const WorkValue>;
+    WriteOutcome writeSkippingDuplicates(std::span<const Row> rows, std::size_t *failedRow);
 
 private:
     sqlite3_stmt *statementFor(std::size_t rows);
-    WriteOutcome step(sqlite3_stmt *statement, std::span<const WorkValue> values);
+    WriteOutcome step(sqlite3_stmt *statement, std::span<const Row> rows);
 
     sqlite3 *m_handle = nullptr;
     QString m_table;
@@ -59,6 +60,7 @@ private:
     sqlite3_stmt *m_statements[MaxRowsAtOnce] = {}; // [n - 1] inserts n rows; made when first needed
     int m_columnCount = 0;
     std::vector<WorkValue> m_converted; // a row of QVariants made ready to bind
+    std::vector<QByteArray> m_encoded;  // the UTF-16 texts of the rows being written, in UTF-8
     QString m_prepareError;
 };
 

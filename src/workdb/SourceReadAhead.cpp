@@ -101,14 +101,18 @@ void SourceReadAhead::publish(std::vector<WorkValue> &batch, bool last, Status f
     m_changed.wait(lock, [this] { return m_cancelled || m_batches.size() < BatchesAhead; });
     if (!batch.empty() && !m_cancelled)
         m_batches.push_back(std::move(batch));
-    batch = {};
-    batch.reserve(RowsPerBatch * m_width);
+    std::vector<std::vector<WorkValue>> spent;
+    spent.swap(m_spent);
     if (last) {
         m_finished = true;
         m_failure = std::move(failure);
     }
     lock.unlock();
     m_changed.notify_all();
+    // The spent batches' values are freed here; one of them is filled anew.
+    batch = spent.empty() ? std::vector<WorkValue>() : std::move(spent.back());
+    batch.clear();
+    batch.reserve(RowsPerBatch * m_width);
 }
 
 Status SourceReadAhead::waitUntilRunning()
@@ -129,6 +133,9 @@ bool SourceReadAhead::next()
     m_changed.wait(lock, [this] { return !m_batches.empty() || m_finished; });
     if (m_batches.empty())
         return false;
+    if (!m_previous.empty())
+        m_spent.push_back(std::move(m_previous));
+    m_previous = std::move(m_current);
     m_current = std::move(m_batches.front());
     m_batches.pop_front();
     m_position = 0;

@@ -52,7 +52,8 @@ public:
 
     // Moves to the next row; false at the end of the rows or when reading failed.
     bool next();
-    // The current row, as the shaper made it; the step may change it.
+    // The current row, as the shaper made it; the step may change it. It stays where it is
+    // until the row after next has been taken.
     std::span<WorkValue> row();
     // Why reading ended before the last row; ok when it reached the end.
     Status readFailure();
@@ -77,10 +78,14 @@ private:
     Status m_refusal;         // why the statement did not run
     Status m_failure;         // why reading ended early
     std::deque<std::vector<WorkValue>> m_batches;
+    // Batches the step has read, handed back so that the thread that made their values frees
+    // them: freeing memory of another thread's heap makes the two threads wait for each other.
+    std::vector<std::vector<WorkValue>> m_spent;
     std::int64_t m_total = 0;
 
-    std::vector<WorkValue> m_current; // the batch the step is reading
-    std::size_t m_position = 0;       // of the current row in m_current, in values
+    std::vector<WorkValue> m_current;  // the batch the step is reading
+    std::vector<WorkValue> m_previous; // the batch before it, whose rows may still be in use
+    std::size_t m_position = 0;        // of the current row in m_current, in values
     bool m_started = false;
 
     std::thread m_thread;

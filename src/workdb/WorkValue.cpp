@@ -6,7 +6,7 @@
 
 namespace zorbin {
 
-WorkValue WorkValue::from(const QVariant &variant)
+WorkValue WorkValue::from(const QVariant &variant, bool encode)
 {
     if (variant.isNull())
         return {};
@@ -31,10 +31,12 @@ WorkValue WorkValue::from(const QVariant &variant)
     case QMetaType::Double:
     case QMetaType::Float:
         return {variant.toDouble()};
-    case QMetaType::QString:
-        return {static_cast<const QString *>(variant.constData())->toUtf8()};
+    case QMetaType::QString: {
+        const QString &text = *static_cast<const QString *>(variant.constData());
+        return encode ? WorkValue{text.toUtf8()} : WorkValue{text};
+    }
     default:
-        return {variant.toString().toUtf8()};
+        return encode ? WorkValue{variant.toString().toUtf8()} : WorkValue{variant.toString()};
     }
 }
 
@@ -42,6 +44,8 @@ QString WorkValue::toText() const
 {
     if (const auto *text = std::get_if<QByteArray>(&value))
         return QString::fromUtf8(*text);
+    if (const auto *text = std::get_if<QString>(&value))
+        return *text;
     if (const auto *whole = std::get_if<std::int64_t>(&value))
         return QString::number(*whole);
     if (const auto *real = std::get_if<double>(&value))

@@ -6,6 +6,7 @@
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 #include "testutil/AccountingFixture.h"
+#include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/SqliteOdbcDriver.h"
 #include "testutil/TestMain.h"
@@ -99,6 +100,7 @@ private:
     ConnectionParams m_connection;
     RunState m_state;
     RecordingUserPort m_user;
+    FaultyFileSystem m_files;
     std::unique_ptr<RunContext> m_context;
 
     ConnectionParams connectionTo(const QString &path) const
@@ -162,8 +164,8 @@ private Q_SLOTS:
         m_connection = connectionTo(m_smallSource);
         m_state = RunState();
         m_user = RecordingUserPort();
-        m_context = std::make_unique<RunContext>(
-            RunContext{*m_settings, m_connection, m_state, m_user, localFileSystem()});
+        m_files.failingPaths.clear();
+        m_context = std::make_unique<RunContext>(RunContext{*m_settings, m_connection, m_state, m_user, m_files});
     }
 
     void theSourceIsReachedThroughTheDriverItsTextNames()
@@ -403,6 +405,19 @@ private Q_SLOTS:
         QVERIFY(m_state.CollectFailed);
         QCOMPARE(m_user.messages.size(), 1);
         QCOMPARE(m_user.messages[0].icon, MessageIcon::Information);
+        QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
+    }
+
+    void aWorkingDatabaseThatCannotBeMadeStopsTheRunAtTheItems()
+    {
+        QVERIFY(collect());
+        m_files.failingPaths.insert(workDatabasePath());
+        QVERIFY(collect());
+        QCOMPARE(m_state.WorkDBFile, QString());
+        QVERIFY(m_state.CollectFailed);
+        QCOMPARE(m_user.messages.size(), 2);
+        QCOMPARE(m_user.messages[0].icon, MessageIcon::Critical);
+        QCOMPARE(m_user.messages[1].icon, MessageIcon::Information);
         QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
     }
 
