@@ -165,7 +165,8 @@ private Q_SLOTS:
         m_state = RunState();
         m_user = RecordingUserPort();
         m_files.failingPaths.clear();
-        m_context = std::make_unique<RunContext>(RunContext{*m_settings, m_connection, m_state, m_user, m_files});
+        m_context =
+            std::make_unique<RunContext>(RunContext{*m_settings, m_connection, m_state, m_user, m_files});
     }
 
     void theSourceIsReachedThroughTheDriverItsTextNames()

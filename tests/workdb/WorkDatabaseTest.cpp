@@ -304,6 +304,48 @@ private Q_SLOTS:
         QCOMPARE(writer.write(row({QStringLiteral("d"), 1.5, 1.0})).refusal(), Refusal::WrongKind);
     }
 
+    void aFewRowsAtOnceAsIfOneByOne()
+    {
+        RowWriter writer(*m_work, QStringLiteral("tItemSort"),
+                         {QStringLiteral("ItemSort"), QStringLiteral("SortName")});
+        const auto group = [](std::int64_t code, const char *name) {
+            return std::vector<WorkValue>{{code}, {QByteArray(name)}};
+        };
+        // All five accepted: one statement.
+        std::vector<std::vector<WorkValue>> first = {group(1, "a"), group(2, "b"), group(3, "c"),
+                                                     group(4, "d"), group(5, "e")};
+        std::vector<RowWriter::Row> rows(first.begin(), first.end());
+        std::size_t failed = 99;
+        QVERIFY(writer.writeSkippingDuplicates(rows, &failed));
+        // A duplicate is passed over; the first other refusal ends the group, and the rows after it stay
+        // unwritten.
+        std::vector<std::vector<WorkValue>> second = {
+            group(6, "f"), group(1, "again"), group(7, "g"),
+            group(8, QString(51, QLatin1Char('x')).toUtf8().constData()), group(9, "i")};
+        rows.assign(second.begin(), second.end());
+        const WriteOutcome refused = writer.writeSkippingDuplicates(rows, &failed);
+        QCOMPARE(refused.refusal(), Refusal::TooLong);
+        QCOMPARE(failed, std::size_t(3));
+        QCOMPARE(column(*m_work, QStringLiteral("SELECT ItemSort || SortName FROM tItemSort")),
+                 QStringList({QStringLiteral("1a"), QStringLiteral("2b"), QStringLiteral("3c"),
+                              QStringLiteral("4d"), QStringLiteral("5e"), QStringLiteral("6f"),
+                              QStringLiteral("7g")}));
+    }
+
+    void textsAreStoredWhole()
+    {
+        const QString withZero = QStringLiteral("a") + QChar(0) + QStringLiteral("b");
+        RowWriter writer(*m_work, QStringLiteral("tExtraNote1"),
+                         {QStringLiteral("ItemKey"), QStringLiteral("ExtraNote")});
+        QVERIFY(writer.write(row({QStringLiteral("zero"), withZero})));
+        const std::vector<WorkValue> unencoded = {WorkValue::from(QStringLiteral("utf16"), false),
+                                                  WorkValue::from(QStringLiteral("שלום עולם"), false)};
+        QVERIFY(writer.write(std::span<const WorkValue>(unencoded)));
+        QCOMPARE(readWorkTable(m_path, QStringLiteral("tExtraNote1")),
+                 QList<QVariantList>({{QStringLiteral("utf16"), QStringLiteral("שלום עולם")},
+                                      {QStringLiteral("zero"), withZero}}));
+    }
+
     void emptyTextIsStored()
     {
         QVERIFY(insertItem(QStringLiteral("e"), QString(QLatin1String(""))));
