@@ -27,9 +27,9 @@ NumberRule ruleOf(NumericSetting setting)
     case NumericSetting::Cols:
         return {QStringLiteral("עמודות"), pageTab, 1, 999, false};
     case NumericSetting::TopPercent:
-        return {QStringLiteral("גובה הכותרת העליונה"), titlesTab, 0, 99, false};
+        return {QStringLiteral("גובה הכותרת העליונה"), titlesTab, 0, 99, true};
     case NumericSetting::BottomPercent:
-        return {QStringLiteral("גובה הכותרת התחתונה"), titlesTab, 0, 99, false};
+        return {QStringLiteral("גובה הכותרת התחתונה"), titlesTab, 0, 99, true};
     case NumericSetting::ImageH:
         return {QStringLiteral("גובה מקסימלי לתמונה"), pageTab, 0, 999, true};
     case NumericSetting::ImageW:

@@ -15,8 +15,8 @@ struct CatalogSettings;
 enum class NumericSetting {
     Rows,          // txtRows: a whole number from 1 to 999
     Cols,          // txtCols: a whole number from 1 to 999
-    TopPercent,    // txtTopPercent: 0 to 99
-    BottomPercent, // txtBottomPercent: 0 to 99
+    TopPercent,    // txtTopPercent: 0 to 99, or empty (as 0) for no top band, as earlier versions read it
+    BottomPercent, // txtBottomPercent: 0 to 99, or empty for no bottom band
     ImageH,        // txtImageH: 0 to 999, or empty for no largest size
     ImageW,        // txtImageW: 0 to 999, or empty for no largest size
 };

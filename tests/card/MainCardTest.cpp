@@ -312,8 +312,6 @@ private Q_SLOTS:
         QTest::newRow("no rows") << QStringLiteral("txtRows") << QStringLiteral("0")
                                  << QStringLiteral("שורות");
         QTest::newRow("empty columns") << QStringLiteral("txtCols") << QString() << QStringLiteral("עמודות");
-        QTest::newRow("empty top band")
-            << QStringLiteral("txtTopPercent") << QString() << QStringLiteral("גובה הכותרת העליונה");
     }
     void numbersAreCheckedAsTypedAndBeforeARun()
     {

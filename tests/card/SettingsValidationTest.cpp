@@ -33,7 +33,8 @@ private Q_SLOTS:
         QTest::newRow("band 0") << top << QStringLiteral("0") << true;
         QTest::newRow("band 99") << top << QStringLiteral("99") << true;
         QTest::newRow("band 100") << top << QStringLiteral("100") << false;
-        QTest::newRow("bottom band empty") << NumericSetting::BottomPercent << QString() << false;
+        QTest::newRow("no bottom band") << NumericSetting::BottomPercent << QString() << true;
+        QTest::newRow("bottom band a word") << NumericSetting::BottomPercent << QStringLiteral("x") << false;
         QTest::newRow("no largest height") << height << QString() << true;
         QTest::newRow("height 0") << height << QStringLiteral("0") << true;
         QTest::newRow("height 999") << height << QStringLiteral("999") << true;
