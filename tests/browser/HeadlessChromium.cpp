@@ -21,6 +21,11 @@ QJsonObject failure(const QString &text)
 std::optional<QByteArray> runBrowser(const QStringList &arguments, QString &diagnosis)
 {
     QProcess browser;
+    // The browser puts its single-instance socket under TMPDIR; a test's own temporary folder
+    // in a deep checkout passes the 107 bytes a socket path may have, and the browser aborts.
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert(QStringLiteral("TMPDIR"), QStringLiteral("/tmp"));
+    browser.setProcessEnvironment(environment);
     browser.start(QStringLiteral(ZORBIN_CHROMIUM), arguments);
     if (!browser.waitForStarted()) {
         diagnosis = QStringLiteral("%1 did not start: %2")
