@@ -10,6 +10,7 @@ void StepClock::start()
     m_steps.clear();
     m_messages = 0;
     m_yields = 0;
+    m_eventRounds = 0;
     m_yieldNanoseconds = 0;
     m_clock.start();
     m_stepStart = m_clock.nsecsElapsed();
@@ -42,9 +43,12 @@ void StepClock::showStatus(const QString &text)
 
 void StepClock::yield()
 {
-    const qint64 before = m_clock.nsecsElapsed();
-    QCoreApplication::processEvents();
     ++m_yields;
+    const qint64 before = m_clock.nsecsElapsed();
+    if (!m_events.due())
+        return;
+    QCoreApplication::processEvents();
+    ++m_eventRounds;
     m_yieldNanoseconds += m_clock.nsecsElapsed() - before;
 }
 

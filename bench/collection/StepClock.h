@@ -1,6 +1,7 @@
 #pragma once
 
 #include "control/UserPort.h"
+#include "platform/EventPacer.h"
 
 #include <QElapsedTimer>
 #include <QStringList>
@@ -10,7 +11,7 @@ namespace zorbin::bench {
 
 // A UserPort for timing a collection run: every status text starts a new step, whose length
 // runs to the next text (the last to finish()). Messages go to standard error; yields let
-// Qt handle its events, as the desktop program does.
+// Qt handle its events, paced as the desktop program paces them.
 class StepClock final : public UserPort
 {
 public:
@@ -26,6 +27,7 @@ public:
     int messageCount() const { return m_messages; }
     // The progress points and the time spent at them letting Qt handle its events.
     int yields() const { return m_yields; }
+    int eventRounds() const { return m_eventRounds; }
     double yieldSeconds() const { return static_cast<double>(m_yieldNanoseconds) / 1e9; }
 
     Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
@@ -46,6 +48,8 @@ private:
     int m_fill = 0;
     int m_messages = 0;
     int m_yields = 0;
+    int m_eventRounds = 0;
+    EventPacer m_events; // as the desktop program paces them
     qint64 m_yieldNanoseconds = 0;
 };
 

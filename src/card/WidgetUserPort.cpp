@@ -81,7 +81,8 @@ void WidgetUserPort::setProgressFillWidth(int width)
 
 void WidgetUserPort::yield()
 {
-    QCoreApplication::processEvents();
+    if (m_events.due())
+        QCoreApplication::processEvents();
 }
 
 Status WidgetUserPort::openBrowser(const QString &file)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "control/UserPort.h"
+#include "platform/EventPacer.h"
 
 #include <functional>
 
@@ -35,6 +36,7 @@ private:
     QLabel *m_statusLine;
     ProgressStrip *m_progress;
     std::function<void(bool)> m_onBusy;
+    EventPacer m_events;
 };
 
 } // namespace zorbin
