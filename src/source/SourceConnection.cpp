@@ -1,22 +1,16 @@
 #include "source/SourceConnection.h"
 
+#include "common/ConnectionName.h"
 #include "source/ConnectionString.h"
 #include "source/DatabaseFile.h"
 #include "source/OdbcTableReader.h"
 #include "source/SourceFaults.h"
 
-#include <QAtomicInteger>
 #include <QDir>
 #include <QSqlError>
 
 namespace zorbin {
 namespace {
-
-QString nextConnectionName()
-{
-    static QAtomicInteger<quint64> counter;
-    return QStringLiteral("zorbin-source-%1").arg(++counter);
-}
 
 bool isJetProvider(const QString &provider)
 {
@@ -64,7 +58,7 @@ Result<std::unique_ptr<SourceConnection>> SourceConnection::open(const QString &
     if (connectionString.isEmpty())
         return Status::fault(noConnectionTypeFault());
 
-    std::unique_ptr<SourceConnection> connection(new SourceConnection(nextConnectionName()));
+    std::unique_ptr<SourceConnection> connection(new SourceConnection(uniqueConnectionName(QStringLiteral("source"))));
     Status opened;
     if (!isOleDbConnString(connectionString)) {
         opened = connection->openOdbc(connectionString);

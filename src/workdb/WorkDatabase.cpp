@@ -1,9 +1,9 @@
 #include "workdb/WorkDatabase.h"
 
+#include "common/ConnectionName.h"
 #include "workdb/BooleanLiterals.h"
 #include "workdb/HebrewCollation.h"
 
-#include <QAtomicInteger>
 #include <QDir>
 #include <QFileInfo>
 #include <QSqlDriver>
@@ -12,12 +12,6 @@
 
 namespace zorbin {
 namespace {
-
-QString nextConnectionName()
-{
-    static QAtomicInteger<quint64> counter;
-    return QStringLiteral("zorbin-work-%1").arg(++counter);
-}
 
 QString describe(const QSqlError &error)
 {
@@ -54,7 +48,7 @@ Result<std::unique_ptr<WorkDatabase>> WorkDatabase::open(const QString &path)
 // Opens (and, for a path that does not exist yet, creates) the file and registers the collation.
 Result<std::unique_ptr<WorkDatabase>> WorkDatabase::connect(const QString &path)
 {
-    std::unique_ptr<WorkDatabase> work(new WorkDatabase(nextConnectionName(), path));
+    std::unique_ptr<WorkDatabase> work(new WorkDatabase(uniqueConnectionName(QStringLiteral("work")), path));
     QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), work->m_connectionName);
     db.setDatabaseName(path);
     if (!db.open())
