@@ -1,6 +1,7 @@
 #include "output/FileNaming.h"
 
 #include "common/Numbers.h"
+#include "platform/HtmlReference.h"
 #include "platform/Paths.h"
 
 namespace zorbin {
@@ -63,26 +64,10 @@ QString escapeHtml(const QString &text)
     QString escaped;
     escaped.reserve(text.size());
     for (const QChar c : text) {
-        switch (c.unicode()) {
-        case u'&':
-            escaped += QStringLiteral("&amp;");
-            break;
-        case u'<':
-            escaped += QStringLiteral("&lt;");
-            break;
-        case u'>':
-            escaped += QStringLiteral("&gt;");
-            break;
-        case u'"':
-            escaped += QStringLiteral("&quot;");
-            break;
-        case u'\'':
-            escaped += QStringLiteral("&#39;");
-            break;
-        default:
+        if (const QLatin1StringView reference = htmlReference(c.unicode()); !reference.isEmpty())
+            escaped += reference;
+        else
             escaped += c;
-            break;
-        }
     }
     return escaped;
 }

@@ -1,54 +1,96 @@
 #include "platform/Windows1255Encoder.h"
 
-#include <unicode/ucnv.h>
-#include <unicode/ucnv_cb.h>
+#include "platform/Windows1255Table.h"
+
+#include <QChar>
+#include <charconv>
+#include <utility>
 
 namespace zorbin {
+namespace {
 
-Windows1255Encoder::Windows1255Encoder()
+void appendReference(char32_t code, QByteArray &out)
 {
-    UErrorCode error = U_ZERO_ERROR;
-    m_converter = ucnv_open("windows-1255", &error);
-    if (U_FAILURE(error)) {
-        m_converter = nullptr;
-        return;
-    }
-    ucnv_setFromUCallBack(m_converter, UCNV_FROM_U_CALLBACK_ESCAPE, UCNV_ESCAPE_XML_DEC, nullptr, nullptr,
-                          &error);
-    if (U_FAILURE(error)) {
-        ucnv_close(m_converter);
-        m_converter = nullptr;
-    }
+    char digits[16];
+    const auto end = std::to_chars(digits, digits + sizeof digits, static_cast<std::uint32_t>(code)).ptr;
+    out.append("&#", 2).append(digits, end - digits).append(';');
 }
 
-Windows1255Encoder::~Windows1255Encoder()
-{
-    if (m_converter)
-        ucnv_close(m_converter);
-}
+} // namespace
+
+Windows1255Encoder::Windows1255Encoder() : m_table(windows1255Table()) {}
 
 void Windows1255Encoder::encode(QStringView text, QByteArray &out, bool last)
 {
-    if (!m_converter)
+    if (!m_table)
         return;
-    static_assert(sizeof(UChar) == sizeof(QChar));
-    const auto *source = reinterpret_cast<const UChar *>(text.utf16());
-    const UChar *const sourceEnd = source + text.size();
-    // Most characters take one byte; a character reference takes up to ten.
-    qsizetype written = out.size();
-    qsizetype room = text.size() + 16;
-    for (;;) {
-        out.resize(written + room);
-        char *target = out.data() + written;
-        UErrorCode error = U_ZERO_ERROR;
-        ucnv_fromUnicode(m_converter, &target, out.data() + out.size(), &source, sourceEnd, nullptr, last,
-                         &error);
-        written = target - out.data();
-        if (error != U_BUFFER_OVERFLOW_ERROR)
-            break;
-        room = (sourceEnd - source) * 10 + 16;
+    const char16_t *begin = text.utf16();
+    const char16_t *const end = begin + text.size();
+    if (m_heldHigh && begin != end) {
+        const char16_t high = std::exchange(m_heldHigh, 0);
+        if (QChar::isLowSurrogate(*begin)) {
+            appendCharacter(QChar::surrogateToUcs4(high, *begin), out);
+            ++begin;
+        } else {
+            appendReference(high, out);
+        }
     }
-    out.resize(written);
+    encodeFrom(begin, end, out);
+    if (last)
+        finish(out);
+}
+
+void Windows1255Encoder::finish(QByteArray &out)
+{
+    if (m_heldHigh)
+        appendReference(std::exchange(m_heldHigh, 0), out);
+}
+
+void Windows1255Encoder::encodeFrom(const char16_t *begin, const char16_t *end, QByteArray &out)
+{
+    // Nearly every character takes one byte: the bytes are written in place, and the room is
+    // made anew only after a character that takes more or none.
+    qsizetype written = out.size();
+    out.resize(written + (end - begin));
+    char *target = out.data() + written;
+    const std::uint16_t *const bytes = m_table->bmp.data();
+    for (const char16_t *c = begin; c != end; ++c) {
+        if (*c < 0x80) {
+            *target++ = static_cast<char>(*c);
+            continue;
+        }
+        if (const std::uint16_t byte = bytes[*c]; byte <= 0xFF) {
+            *target++ = static_cast<char>(byte);
+            continue;
+        }
+        char32_t code = *c;
+        if (QChar::isHighSurrogate(*c)) {
+            if (c + 1 == end) {
+                m_heldHigh = *c;
+                break;
+            }
+            if (QChar::isLowSurrogate(c[1])) {
+                code = QChar::surrogateToUcs4(c[0], c[1]);
+                ++c;
+            }
+        }
+        out.truncate(target - out.data());
+        if (code > 0xFFFF)
+            appendCharacter(code, out);
+        else if (bytes[code] == Windows1255Table::Reference)
+            appendReference(code, out);
+        written = out.size();
+        out.resize(written + (end - c - 1));
+        target = out.data() + written;
+    }
+    out.truncate(target - out.data());
+}
+
+// A character above U+FFFF: the code page has none.
+void Windows1255Encoder::appendCharacter(char32_t code, QByteArray &out) const
+{
+    if (m_table->aboveBmp(code) == Windows1255Table::Reference)
+        appendReference(code, out);
 }
 
 QByteArray Windows1255Encoder::encoded(QStringView text)

@@ -3,6 +3,7 @@
 #include "common/Status.h"
 #include "platform/Windows1255Encoder.h"
 
+#include <QByteArrayView>
 #include <QIODevice>
 #include <QString>
 #include <memory>
@@ -14,7 +15,7 @@ class FileSystem;
 // A text file of the catalog, written line by line in windows-1255, every line ended by
 // carriage return and line feed (see Windows1255Encoder for characters the code page lacks).
 //
-// Writes are buffered. The first failure to write is kept and every later write is dropped;
+// Text is encoded as it comes and the bytes handed to the file in large blocks. The first failure to write is kept and every later write is dropped;
 // close() reports it. A writer destroyed without close() writes what it holds and closes the
 // file, ignoring failures.
 class Windows1255Writer
@@ -33,6 +34,11 @@ public:
     void writeLine(QStringView text);
     // A line end.
     void endLine();
+    // Text of a working-database value: markup characters go in as their references (see
+    // htmlReference), so that the value can neither break the page nor add markup to it.
+    void writeEscaped(QStringView text);
+    // Bytes already in the code page, such as the fixed parts of a page encoded once a run.
+    void writeEncoded(QByteArrayView bytes);
 
     // Whether every write so far reached the file.
     bool isOk() const { return m_status.isOk(); }
@@ -45,13 +51,13 @@ public:
 
 private:
     Windows1255Writer(std::unique_ptr<QIODevice> device, QString path);
-    void flushPending(bool last);
+    void flushIfFull();
+    void flush();
 
     std::unique_ptr<QIODevice> m_device;
     QString m_path;
     Windows1255Encoder m_encoder;
-    QString m_pending;
-    QByteArray m_bytes;
+    QByteArray m_bytes; // encoded, not yet handed to the file
     Status m_status;
     qint64 m_bytesWritten = 0;
 };

@@ -9,6 +9,8 @@
 #include <QLocale>
 #include <QTemporaryDir>
 #include <QTest>
+#include <unicode/ucnv.h>
+#include <unicode/ucnv_cb.h>
 
 using namespace zorbin;
 
@@ -57,6 +59,40 @@ private:
     static FileSystem &real() { return localFileSystem(); }
 };
 
+// The system's ICU converter with decimal references for what the code page lacks: what the
+// table-driven encoder must give, byte for byte.
+QByteArray icuEncoded(QStringView text)
+{
+    UErrorCode error = U_ZERO_ERROR;
+    UConverter *converter = ucnv_open("windows-1255", &error);
+    ucnv_setFromUCallBack(converter, UCNV_FROM_U_CALLBACK_ESCAPE, UCNV_ESCAPE_XML_DEC, nullptr, nullptr,
+                          &error);
+    QByteArray bytes(text.size() * 10 + 16, Qt::Uninitialized);
+    const int32_t length = ucnv_fromUChars(converter, bytes.data(), static_cast<int32_t>(bytes.size()),
+                                           reinterpret_cast<const UChar *>(text.utf16()),
+                                           static_cast<int32_t>(text.size()), &error);
+    ucnv_close(converter);
+    bytes.truncate(U_SUCCESS(error) ? length : 0);
+    return bytes;
+}
+
+// Every text of up to `length` code units made of `units`.
+QStringList allTexts(const QList<char16_t> &units, int length)
+{
+    QStringList texts{QString()};
+    QStringList shorter = texts;
+    for (int i = 0; i < length; ++i) {
+        QStringList longer;
+        for (const QString &text : std::as_const(shorter)) {
+            for (const char16_t unit : units)
+                longer << text + QChar(unit);
+        }
+        texts += longer;
+        shorter = longer;
+    }
+    return texts;
+}
+
 } // namespace
 
 class EncodingTest : public QObject
@@ -75,6 +111,7 @@ private Q_SLOTS:
         QTest::newRow("emoji") << QStringLiteral("A\U0001F600B") << QByteArray("A&#128512;B");
         QTest::newRow("chinese") << QStringLiteral("\u82B1\u74F6") << QByteArray("&#33457;&#29942;");
         QTest::newRow("lone surrogate") << QString(QChar(0xD83D)) << QByteArray("&#55357;");
+        QTest::newRow("invisible") << QStringLiteral("a\u200Bb\U000E0041c\uFE0F") << QByteArray("abc");
     }
 
     void codePage()
@@ -92,6 +129,54 @@ private Q_SLOTS:
         encoder.encode(QStringView(text).left(2), bytes);
         encoder.encode(QStringView(text).mid(2), bytes, true);
         QCOMPARE(bytes, QByteArray("x&#128512;y"));
+    }
+
+    void everyCharacterAsIcuHasIt()
+    {
+        QString text;
+        for (char32_t code = 1; code <= QChar::LastValidCodePoint; ++code) {
+            if (!QChar::isSurrogate(code))
+                text += QString::fromUcs4(&code, 1);
+        }
+        const QByteArray expected = icuEncoded(text);
+        QVERIFY(!expected.isEmpty());
+        QCOMPARE(Windows1255Encoder::encoded(text), expected);
+    }
+
+    // Pairs, lone halves and a half next to markup or Hebrew, whole and cut into two pieces
+    // at every place.
+    void surrogateHalvesAsIcuHasThem()
+    {
+        const QList<char16_t> units{u'a', u'&', 0x05E9, 0x05B8, 0x200B, 0x82B1, 0xD83D, 0xDE00, 0xDB40};
+        for (const QString &text : allTexts(units, 4)) {
+            const QByteArray expected = icuEncoded(text);
+            QCOMPARE(Windows1255Encoder::encoded(text), expected);
+            for (qsizetype cut = 0; cut <= text.size(); ++cut) {
+                Windows1255Encoder encoder;
+                QByteArray bytes;
+                encoder.encode(QStringView(text).left(cut), bytes);
+                encoder.encode(QStringView(text).mid(cut), bytes, true);
+                QCOMPARE(bytes, expected);
+            }
+        }
+    }
+
+    void writerEscapesValues()
+    {
+        QTemporaryDir dir;
+        const QString path = dir.filePath(QStringLiteral("values.htm"));
+        auto writer = Windows1255Writer::create(localFileSystem(), path);
+        QVERIFY(writer.isOk());
+        writer.value()->write(u"<td>");
+        writer.value()->writeEscaped(QStringLiteral("\u05E9\"\u05D7 <b>&'x'"));
+        writer.value()->writeEscaped(QStringLiteral("\U0001F600&\u82B1"));
+        // A lone first half of a pair ends before the reference of the markup after it.
+        writer.value()->writeEscaped(QString(QChar(0xD83D)) + QStringLiteral("<"));
+        writer.value()->writeEscaped(QString(QChar(0xD83D)));
+        writer.value()->writeLine(u"</td>");
+        QVERIFY(writer.value()->close().isOk());
+        QCOMPARE(test::readFile(path), QByteArray("<td>\xF9&quot;\xE7 &lt;b&gt;&amp;&#39;x&#39;"
+                                                  "&#128512;&amp;&#33457;&#55357;&lt;&#55357;</td>\r\n"));
     }
 
     void writerEndsLinesWithCrLfAndReplacesTheFile()
