@@ -1,6 +1,8 @@
 #include "platform/ValueFormat.h"
 
 #include <QLocale>
+#include <algorithm>
+#include <charconv>
 #include <cmath>
 
 namespace zorbin {
@@ -8,19 +10,6 @@ namespace {
 
 // Above this a double no longer holds every cent exactly; such amounts are printed as they are.
 constexpr double ExactCentsLimit = 1e13;
-
-QString groupedDigits(const QString &digits, const QString &group)
-{
-    QString grouped;
-    grouped.reserve(digits.size() + digits.size() / 3 * group.size());
-    const qsizetype count = digits.size();
-    for (qsizetype i = 0; i < count; ++i) {
-        if (i > 0 && (count - i) % 3 == 0)
-            grouped += group;
-        grouped += digits.at(i);
-    }
-    return grouped;
-}
 
 // The date separator of a locale's short date format: the first mark between its fields.
 QString dateSeparatorOf(const QLocale &locale)
@@ -54,23 +43,37 @@ QString formatAmount(double value, const Separators &separators)
 {
     if (!std::isfinite(value))
         return QString::number(value);
-    QString digits;
-    QString cents;
+    // Digits by hand rather than through QString::arg: a catalog formats a price in every cell.
+    char digits[32];
+    char *digitsEnd = digits;
+    int cents = 0;
     bool negative = false;
     if (std::fabs(value) < ExactCentsLimit) {
         const long long all = std::llround(value * 100.0);
         negative = all < 0;
         const long long magnitude = negative ? -all : all;
-        digits = QString::number(magnitude / 100);
-        cents = QStringLiteral("%1").arg(magnitude % 100, 2, 10, QLatin1Char('0'));
+        digitsEnd = std::to_chars(digits, digits + sizeof digits, magnitude / 100).ptr;
+        cents = static_cast<int>(magnitude % 100);
     } else {
         negative = value < 0;
-        const QString fixed = QString::number(std::fabs(value), 'f', 2);
-        digits = fixed.left(fixed.size() - 3);
-        cents = fixed.right(2);
+        const QByteArray fixed = QByteArray::number(std::fabs(value), 'f', 2);
+        digitsEnd = std::copy(fixed.begin(), fixed.end() - 3, digits);
+        cents = (fixed.at(fixed.size() - 2) - '0') * 10 + (fixed.at(fixed.size() - 1) - '0');
     }
-    return (negative ? QStringLiteral("-") : QString()) + groupedDigits(digits, separators.group) +
-           separators.decimal + cents;
+    const qsizetype count = digitsEnd - digits;
+    QString text;
+    text.reserve(count + count / 3 * separators.group.size() + separators.decimal.size() + 3);
+    if (negative)
+        text += QLatin1Char('-');
+    for (qsizetype i = 0; i < count; ++i) {
+        if (i > 0 && (count - i) % 3 == 0)
+            text += separators.group;
+        text += QLatin1Char(digits[i]);
+    }
+    text += separators.decimal;
+    text += QLatin1Char(static_cast<char>('0' + cents / 10));
+    text += QLatin1Char(static_cast<char>('0' + cents % 10));
+    return text;
 }
 
 QString formatDate(const QDate &date, const Separators &separators)
