@@ -54,9 +54,15 @@ Result<bool> writeItemRows(Windows1255Writer &list, CatalogRows &rows, ProgressM
     long long done = 0;
     while (rows.next()) {
         list.writeLine(u"  <tr bgcolor='#FFFFFF' align='right'>");
-        list.writeLine(QStringLiteral("    <td>") + HTMLText(rows.value(name)) + QStringLiteral("</td>"));
-        list.writeLine(QStringLiteral("    <td>") + escapeHtml(rows.value(key).toString()) +
-                       QStringLiteral("</td>"));
+        list.write(u"    <td>");
+        if (const QVariant value = rows.value(name); value.isNull())
+            list.write(u"&nbsp;");
+        else
+            list.writeEscaped(value.toString());
+        list.writeLine(u"</td>");
+        list.write(u"    <td>");
+        list.writeEscaped(rows.value(key).toString());
+        list.writeLine(u"</td>");
         list.writeLine(u"  </tr>");
         if (meter.point(++done, rows.count()))
             return true;
