@@ -16,6 +16,7 @@
 #include "testutil/SqliteOdbcDriver.h"
 #include "workdb/CollectionRun.h"
 #include "workdb/SourceStatements.h"
+#include "workdb/SqliteEngine.h"
 #include "workdb/WorkDatabase.h"
 #include "workdb/WorkDatabasePath.h"
 
@@ -199,6 +200,7 @@ Totals runFloor(const CatalogSettings &settings, const QString &sourcePath, cons
 
 int main(int argc, char *argv[])
 {
+    zorbin::setUpSqliteEngine();
     QCoreApplication app(argc, argv);
     int items = 100000;
     const QStringList arguments = app.arguments();

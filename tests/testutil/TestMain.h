@@ -1,5 +1,7 @@
 #pragma once
 
+#include "workdb/SqliteEngine.h"
+
 #include <QObject>
 #include <memory>
 #include <vector>
@@ -29,6 +31,7 @@ int runTestObjects(int argc, char *argv[], const std::vector<std::unique_ptr<QOb
 #define ZORBIN_TEST_MAIN_BEGIN(AppType)                                                                      \
     int main(int argc, char *argv[])                                                                         \
     {                                                                                                        \
+        zorbin::setUpSqliteEngine(); /* as the programs do */                                                \
         AppType app(argc, argv);                                                                             \
         std::vector<std::unique_ptr<QObject>> tests;
 #define ZORBIN_TEST_ADD(Class) tests.push_back(make##Class());
