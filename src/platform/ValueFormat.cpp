@@ -22,6 +22,36 @@ QString dateSeparatorOf(const QLocale &locale)
     return {};
 }
 
+// The whole cents of a magnitude below ExactCentsLimit, a half cent rounded up. The half is
+// judged on the fifteen significant digits that a double holds faithfully, as the amount was
+// typed: 1.005 is stored as 1.00499999999999989... and must still give 101 cents.
+long long roundedCents(double magnitude)
+{
+    char text[32];
+    const char *const end =
+        std::to_chars(text, text + sizeof text, magnitude, std::chars_format::scientific, 14).ptr;
+    long long digits = 0; // the fifteen digits of "d.dddddddddddddde±x", without the point
+    const char *c = text;
+    for (; c != end && *c != 'e'; ++c) {
+        if (*c != '.')
+            digits = digits * 10 + (*c - '0');
+    }
+    int exponent = 0;
+    std::from_chars(*(c + 1) == '+' ? c + 2 : c + 1, end, exponent);
+    // cents = digits x 10^(exponent - 12); the power is positive only for an amount that
+    // rounds up to the limit itself.
+    int dropped = 12 - exponent;
+    for (; dropped < 0; ++dropped)
+        digits *= 10;
+    if (dropped > 15)
+        return 0;
+    long long divisor = 1;
+    for (int i = 0; i < dropped; ++i)
+        divisor *= 10;
+    const long long cents = digits / divisor;
+    return digits % divisor * 2 >= divisor ? cents + 1 : cents;
+}
+
 } // namespace
 
 Separators Separators::ofSystem()
@@ -49,11 +79,10 @@ QString formatAmount(double value, const Separators &separators)
     int cents = 0;
     bool negative = false;
     if (std::fabs(value) < ExactCentsLimit) {
-        const long long all = std::llround(value * 100.0);
-        negative = all < 0;
-        const long long magnitude = negative ? -all : all;
-        digitsEnd = std::to_chars(digits, digits + sizeof digits, magnitude / 100).ptr;
-        cents = static_cast<int>(magnitude % 100);
+        const long long all = roundedCents(std::fabs(value));
+        negative = value < 0 && all != 0;
+        digitsEnd = std::to_chars(digits, digits + sizeof digits, all / 100).ptr;
+        cents = static_cast<int>(all % 100);
     } else {
         negative = value < 0;
         const QByteArray fixed = QByteArray::number(std::fabs(value), 'f', 2);

@@ -20,8 +20,9 @@ struct Separators
 };
 
 // A number with the pattern "###,##0.00": thousands grouped, at least one digit before the
-// decimal mark, exactly two after it, a half cent rounded away from zero (1234.5 gives
-// "1,234.50", 0 gives "0.00", -3 gives "-3.00"; a value that rounds to zero has no sign).
+// decimal mark, exactly two after it, a half cent rounded away from zero as the amount reads in
+// decimal (1234.5 gives "1,234.50", 1.005 gives "1.01", 0 gives "0.00", -3 gives "-3.00"; a
+// value that rounds to zero has no sign).
 QString formatAmount(double value, const Separators &separators);
 
 // A date with the pattern "dd/mm/yyyy": two-digit day, two-digit month, four-digit year.

@@ -246,6 +246,13 @@ private Q_SLOTS:
         QTest::newRow("million") << 1000000.0 << QStringLiteral("1,000,000.00");
         QTest::newRow("negative thousands") << -98765.432 << QStringLiteral("-98,765.43");
         QTest::newRow("half cent up") << 0.125 << QStringLiteral("0.13");
+        // Halves that a double holds a hair below the half (1.00499999999999989...).
+        QTest::newRow("typed half cent 1.005") << 1.005 << QStringLiteral("1.01");
+        QTest::newRow("typed half cent 0.285") << 0.285 << QStringLiteral("0.29");
+        QTest::newRow("typed negative half cent") << -1.005 << QStringLiteral("-1.01");
+        QTest::newRow("just below a half cent") << 1.0049 << QStringLiteral("1.00");
+        QTest::newRow("below a cent") << 0.004 << QStringLiteral("0.00");
+        QTest::newRow("largest exact") << 9999999999999.99 << QStringLiteral("9,999,999,999,999.99");
         QTest::newRow("rounds up to a thousand") << 999.999 << QStringLiteral("1,000.00");
         QTest::newRow("tiny negative has no sign") << -0.001 << QStringLiteral("0.00");
         QTest::newRow("huge") << 123456789012345.0 << QStringLiteral("123,456,789,012,345.00");
