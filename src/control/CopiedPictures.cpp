@@ -21,7 +21,7 @@ QStringList CopiedPictures::read(const FileSystem &files, const QString &imagesF
         const QString name = line.trimmed();
         // Only bare names: a damaged record must not send the clean-up out of the folder.
         if (!name.isEmpty() && !name.contains(QLatin1Char('/')) && !name.contains(QLatin1Char('\\')) &&
-            name != QLatin1String("..") && !names.contains(name))
+            name != QLatin1String(".") && name != QLatin1String("..") && !names.contains(name))
             names << name;
     }
     return names;
@@ -31,6 +31,10 @@ Status CopiedPictures::removeAll(FileSystem &files, const QString &imagesFolder)
 {
     const QString folder = withTrailingSeparator(imagesFolder);
     for (const QString &name : read(files, imagesFolder)) {
+        // A name that is now a folder is not one of our copies; failing on it would end every
+        // later catalog run, since the record would never be cleared.
+        if (!files.fileExists(folder + name))
+            continue;
         if (const Status removed = files.removeFile(folder + name); !removed)
             return removed;
     }

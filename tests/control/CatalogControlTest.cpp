@@ -232,6 +232,26 @@ private Q_SLOTS:
         QVERIFY(!QFileInfo::exists(CopiedPictures::recordPath(rig.images())));
     }
 
+    // A record that names a folder (or the images folder itself) must not stop every later
+    // run: the folder is no copy of ours and stays.
+    void recordNamingAFolderDoesNotBlockTheRun()
+    {
+        Rig rig;
+        QDir().mkpath(rig.images() + QStringLiteral("/mine"));
+        writeFile(rig.images() + QStringLiteral("/A1.JPG"));
+        {
+            CopiedPictures record(rig.files, rig.images());
+            QVERIFY(record.add(QStringLiteral(".")));
+            QVERIFY(record.add(QStringLiteral("mine")));
+            QVERIFY(record.add(QStringLiteral("A1.JPG")));
+        }
+
+        QCOMPARE(rig.control->produceCatalog().ending, RunOutcome::Ending::Shown);
+        QVERIFY(QFileInfo(rig.images() + QStringLiteral("/mine")).isDir());
+        QVERIFY(!QFileInfo::exists(rig.images() + QStringLiteral("/A1.JPG")));
+        QVERIFY(!QFileInfo::exists(CopiedPictures::recordPath(rig.images())));
+    }
+
     void fileInUseEndsTheRunBeforeAnyPage()
     {
         Rig rig;
