@@ -4,18 +4,19 @@
 #include "control/RunContext.h"
 #include "output/CatalogQuery.h"
 #include "source/ConnectionString.h"
+#include "workdb/CollectionRun.h"
 #include "workdb/SourceStatements.h"
 
 namespace zorbin::cli {
 namespace {
 
-// The number of the entry chosen in a list whose step the settings enable; the same fault
-// as the collection's when nothing is chosen.
+// The number of the entry chosen in a list whose step the settings enable; the collection's
+// own fault when nothing is chosen.
 Result<std::int32_t> chosenNumber(const ChoiceList &list, const QString &what)
 {
     if (const auto number = list.currentItemData())
         return *number;
-    return Status::fault(QStringLiteral("סומן לאסוף %1, אך לא נבחר ברשימה איזה.").arg(what));
+    return nothingChosen(what);
 }
 
 } // namespace

@@ -10,15 +10,15 @@
 #include "workdb/WorkDatabasePath.h"
 
 namespace zorbin {
-namespace {
 
-// A price list or extra note that is to be collected while its list has no entry selected.
 Status nothingChosen(const QString &what)
 {
     return Status::fault(QStringLiteral("סומן לאסוף %1, אך לא נבחר ברשימה איזה. "
                                         "יש לבחור אותו בלשונית \"הגדרות נתונים\" או לבטל את הסימון.")
                              .arg(what));
 }
+
+namespace {
 
 // A price list or extra note that the run collects when its check box is ticked.
 struct ChosenList
