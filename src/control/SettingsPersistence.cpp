@@ -140,6 +140,7 @@ void SettingsPersistence::CmdDef_Click()
 {
     SetGetRegParams(SaveAction);
     GetSetFormLabDefs(SaveAction, StoreApp, StoreSection);
+    m_store.flush();
 }
 
 QStringList SettingsPersistence::unappliedKeys() const

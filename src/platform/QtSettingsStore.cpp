@@ -1,6 +1,8 @@
 #include "platform/SettingsStore.h"
 
+#include <QDir>
 #include <QFile>
+#include <QFileInfo>
 #include <QSettings>
 #include <QStringList>
 #include <map>
@@ -39,12 +41,20 @@ public:
         return open(app)->contains(section + QLatin1Char('/') + key);
     }
 
+    ~QtSettingsStore() override { flush(); }
+
     void write(const QString &app, const QString &section, const QString &key, const QString &value) override
     {
-        auto *settings = open(app);
-        settings->setValue(section + QLatin1Char('/') + key, value);
-        settings->sync();
-        restrictToOwner(settings->fileName());
+        open(app)->setValue(section + QLatin1Char('/') + key, value);
+    }
+
+    void flush() override
+    {
+        for (const auto &[name, settings] : m_opened) {
+            createForOwnerOnly(settings->fileName());
+            settings->sync();
+            restrictToOwner(settings->fileName());
+        }
     }
 
 private:
@@ -68,6 +78,20 @@ private:
             QSettings::NativeFormat);
 #else
         return std::make_unique<QSettings>(QSettings::NativeFormat, QSettings::UserScope, app, app);
+#endif
+    }
+
+    // A file about to be written for the first time is made its owner's before the password
+    // goes into it; a rewrite keeps the permissions of the file it replaces.
+    static void createForOwnerOnly(const QString &fileName)
+    {
+#ifndef Q_OS_WIN
+        if (QFile::exists(fileName) || !QDir().mkpath(QFileInfo(fileName).absolutePath()))
+            return;
+        QFile file(fileName);
+        (void)file.open(QIODevice::WriteOnly | QIODevice::NewOnly, QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+#else
+        Q_UNUSED(fileName);
 #endif
     }
 

@@ -18,6 +18,10 @@ public:
     virtual bool contains(const QString &app, const QString &section, const QString &key) const = 0;
     virtual void write(const QString &app, const QString &section, const QString &key,
                        const QString &value) = 0;
+    // Makes the writes so far last. A store does it by itself at the latest when it is destroyed;
+    // a caller that saves many keys calls it once after the last, so that the store does not
+    // rewrite its whole file for every key.
+    virtual void flush() {}
 };
 
 // The user's own store: on Windows the per-user registry area that earlier versions used,

@@ -2,6 +2,7 @@
 
 #include "control/SettingsPersistence.h"
 #include "source/ConnectionStore.h"
+#include "platform/SettingsStore.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 
@@ -59,6 +60,7 @@ void LogonForm::cmdOK_Click(ConnectionParams &params, SettingsStore &store)
     params.database = txtConnDatabase;
     params.type = connectionType();
     SetGetRegConnParams(SaveAction, store);
+    store.flush();
 }
 
 void LogonForm::SetGetRegConnParams(std::uint8_t action, SettingsStore &store)

@@ -43,6 +43,7 @@ private Q_SLOTS:
         auto store = openUserSettingsStore();
         store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnPWD"),
                      QStringLiteral("secret"));
+        store->flush();
         QVERIFY(QFileInfo::exists(path));
         QCOMPARE(QFileInfo(path).permissions() & (OwnerOnly | OthersAndGroup), OwnerOnly);
         QCOMPARE(store->read(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnPWD"),
@@ -63,6 +64,7 @@ private Q_SLOTS:
         auto store = openIniSettingsStore(path);
         store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnPWD"),
                      QStringLiteral("new"));
+        store->flush();
         QCOMPARE(QFileInfo(path).permissions() & (OwnerOnly | OthersAndGroup), OwnerOnly);
 #endif
     }
