@@ -47,8 +47,8 @@ private:
 enum PictureSource : int { PictureFromFileField = 0, PictureFromItemKey = 1, PictureFromExtraNote = 2 };
 
 // Entry limits of the settings page's text boxes, in characters.
-inline constexpr int MaxLengthSortBound = 15;  // txtToSort (and its partner)
-inline constexpr int MaxLengthItemBound = 15;  // txtToItem (and its partner)
+inline constexpr int MaxLengthSortBound = 15;  // txtToSort; txtFromSort has no limit
+inline constexpr int MaxLengthItemBound = 15;  // txtToItem; txtFromItem has no limit
 inline constexpr int MaxLengthGridSize = 3;    // txtRows, txtCols
 inline constexpr int MaxLengthPercent = 2;     // txtTopPercent, txtBottomPercent
 inline constexpr int MaxLengthPictureSize = 3; // txtImageH, txtImageW

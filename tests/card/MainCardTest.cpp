@@ -118,8 +118,10 @@ private Q_SLOTS:
     {
         QTest::addColumn<QString>("name");
         QTest::addColumn<int>("limit");
-        QTest::newRow("sort bound") << QStringLiteral("txtToSort") << 15;
-        QTest::newRow("item bound") << QStringLiteral("txtFromItem") << 15;
+        QTest::newRow("last sort code") << QStringLiteral("txtToSort") << 15;
+        QTest::newRow("last item key") << QStringLiteral("txtToItem") << 15;
+        QTest::newRow("first sort code, no limit") << QStringLiteral("txtFromSort") << 20;
+        QTest::newRow("first item key, no limit") << QStringLiteral("txtFromItem") << 20;
         QTest::newRow("rows") << QStringLiteral("txtRows") << 3;
         QTest::newRow("columns") << QStringLiteral("txtCols") << 3;
         QTest::newRow("top band") << QStringLiteral("txtTopPercent") << 2;

@@ -45,7 +45,8 @@ QWidget *RangeTab::buildRanges()
         auto *fromBox = named<QLineEdit>(fromName, group);
         auto *toBox = named<QLineEdit>(toName, group);
         bind.check(useBox, use);
-        bind.text(fromBox, from, maxLength);
+        // Only the upper bound has an entry limit; the lower one takes a key of any length.
+        bind.text(fromBox, from);
         bind.text(toBox, to, maxLength);
         fromBox->setAccessibleName(checkCaption);
         tabs::fitToCharacters(fromBox, maxLength, QLatin1Char('0'));
