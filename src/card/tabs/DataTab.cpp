@@ -22,9 +22,15 @@ using tabs::named;
 
 namespace {
 
-// What a list shows with no entry selected (an accounting database that could not be reached
-// leaves its lists empty).
-const QString NoEntryText = QStringLiteral("(לא נבחר)");
+// A list filled from the accounting database: wide enough for its longer names, and saying so
+// when no entry is selected (an accounting database that could not be reached leaves it empty).
+void showSourceList(QComboBox *list, const QString &caption)
+{
+    list->setAccessibleName(QString(caption).remove(QLatin1Char(':')));
+    list->setSizeAdjustPolicy(QComboBox::AdjustToContents);
+    list->setMinimumContentsLength(18);
+    list->setPlaceholderText(QStringLiteral("(לא נבחר)"));
+}
 
 // A check box that switches a choice on, and the list to choose from.
 void addSwitchedChoice(QGridLayout *grid, int row, SettingsBinder &bind, const QString &checkName,
@@ -35,10 +41,7 @@ void addSwitchedChoice(QGridLayout *grid, int row, SettingsBinder &bind, const Q
     auto *choice = named<QComboBox>(listName, parent);
     bind.check(useBox, use);
     bind.choice(choice, list);
-    choice->setAccessibleName(QString(caption).remove(QLatin1Char(':')));
-    choice->setSizeAdjustPolicy(QComboBox::AdjustToContents);
-    choice->setMinimumContentsLength(18);
-    choice->setPlaceholderText(NoEntryText);
+    showSourceList(choice, caption);
     grid->addWidget(useBox, row, 0);
     grid->addWidget(choice, row, 1);
 }
@@ -120,10 +123,7 @@ QWidget *DataTab::buildPictures()
     tabs::fitToCharacters(extension, 5);
     tabs::showLeftToRight(folder);
     tabs::showLeftToRight(extension);
-    note->setPlaceholderText(NoEntryText);
-    note->setSizeAdjustPolicy(QComboBox::AdjustToContents);
-    note->setMinimumContentsLength(18);
-    note->setAccessibleName(captions.at(2));
+    showSourceList(note, captions.at(2));
     auto *folderField = new FolderField(folder, QStringLiteral("cmdPicPath"),
                                         QStringLiteral("בחירת מחיצת התמונות"), true, m_context, group);
 
