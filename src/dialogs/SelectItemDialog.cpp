@@ -43,13 +43,16 @@ frmSelectItem::frmSelectItem(const QString &workDBFile, QWidget *parent) : QDial
     m_VSSelectItems = new QTableView(this);
     m_VSSelectItems->setObjectName(QStringLiteral("VSSelectItems"));
     m_VSSelectItems->setModel(m_model);
+    QFont gridFont = m_VSSelectItems->font();
+    gridFont.setFamily(QStringLiteral("Arial"));
+    m_VSSelectItems->setFont(gridFont);
     m_VSSelectItems->setSelectionBehavior(QAbstractItemView::SelectRows);
     m_VSSelectItems->setSelectionMode(QAbstractItemView::SingleSelection);
     m_VSSelectItems->setEditTriggers(QAbstractItemView::NoEditTriggers);
     m_VSSelectItems->setAlternatingRowColors(true);
     m_VSSelectItems->setWordWrap(false);
     m_VSSelectItems->verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
-    m_VSSelectItems->verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 8);
+    m_VSSelectItems->verticalHeader()->setDefaultSectionSize(m_VSSelectItems->fontMetrics().height() + 8);
     m_VSSelectItems->verticalHeader()->setMinimumWidth(designWidth(210, this));
     m_VSSelectItems->horizontalHeader()->setDefaultAlignment(Qt::AlignRight | Qt::AlignVCenter);
     m_VSSelectItems->setMinimumWidth(designWidth(1650 + 2790 + 645 + 210, this) + 24);
