@@ -93,7 +93,7 @@ rm -f "$password_file"
 port=$(free_port 55432)
 for attempt in 1 2 3 4 5; do
     if as_server_user "$bin/pg_ctl" -D "$data" -l "$data/server.log" -w \
-        -o "-c listen_addresses=127.0.0.1 -c port=$port -c unix_socket_directories=$data" start >/dev/null; then
+        -o "-c listen_addresses=127.0.0.1 -c port=$port -c unix_socket_directories=''" start >/dev/null; then
         break
     fi
     [ "$attempt" -eq 5 ] && { cat "$data/server.log" >&2; exit 1; }
@@ -101,8 +101,11 @@ for attempt in 1 2 3 4 5; do
 done
 closed_port=$(free_port $((port + 1)))
 
+# Over TCP only: a socket in the data folder of a deep checkout would pass the 107 bytes that a
+# socket path may have, and the server would not start.
 psql() {
-    as_server_user "$bin/psql" -X -q -v ON_ERROR_STOP=1 -h "$data" -p "$port" -U postgres "$@"
+    as_server_user env PGPASSWORD="$superuser_password" \
+        "$bin/psql" -X -q -v ON_ERROR_STOP=1 -h 127.0.0.1 -p "$port" -U postgres "$@"
 }
 psql -d postgres <<SQL
 CREATE ROLE $reader LOGIN PASSWORD '$reader_password';
