@@ -20,21 +20,22 @@
 # every run: nothing random, no dates.
 set -euo pipefail
 
+usage() {
+    echo "usage: make-demo-db.sh [--items N] [--refer-to FOLDER] OUTPUT_FOLDER" >&2
+    exit 2
+}
 items=""
 refer_to=""
 while [ $# -gt 0 ]; do
     case "$1" in
-        --items) items="$2"; shift 2 ;;
-        --refer-to) refer_to="$2"; shift 2 ;;
-        -h|--help) sed -n '2,23p' "$0"; exit 0 ;;
+        --items) [ $# -ge 2 ] || usage; items="$2"; shift 2 ;;
+        --refer-to) [ $# -ge 2 ] || usage; refer_to="$2"; shift 2 ;;
+        -h|--help) sed -n '2,/^[^#]/{/^#/p}' "$0"; exit 0 ;;
         -*) echo "make-demo-db.sh: unknown option $1" >&2; exit 2 ;;
         *) break ;;
     esac
 done
-if [ $# -ne 1 ]; then
-    echo "usage: make-demo-db.sh [--items N] [--refer-to FOLDER] OUTPUT_FOLDER" >&2
-    exit 2
-fi
+[ $# -eq 1 ] || usage
 if [ -n "$items" ] && ! [[ "$items" =~ ^[1-9][0-9]*$ ]]; then
     echo "make-demo-db.sh: --items needs a whole number above 0, not '$items'" >&2
     exit 2
