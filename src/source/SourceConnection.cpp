@@ -6,7 +6,6 @@
 #include "source/OdbcTableReader.h"
 #include "source/SourceFaults.h"
 
-#include <QDir>
 #include <QSqlError>
 
 namespace zorbin {
@@ -27,8 +26,11 @@ bool isSqlServerProvider(const QString &provider)
     return false;
 }
 
-// One SELECT statement: it starts with SELECT, and no ";" outside a quoted text or name is
-// followed by anything but blanks. A second statement could change the accounting data.
+// One SELECT statement: it starts with SELECT, no ";" outside a quoted text or name is
+// followed by anything but blanks, and there is no comment outside one. A second statement
+// could change the accounting data. Our statements have no comments, and a quote mark inside
+// one would make the rest look quoted here while the server reads it as statements (servers
+// do not even agree on where a nested comment ends), so a comment is refused, not skipped.
 bool isSingleSelect(const QString &sql)
 {
     const QString text = sql.trimmed();
@@ -44,6 +46,8 @@ bool isSingleSelect(const QString &sql)
             closing = c;
         } else if (c == QLatin1Char('[')) {
             closing = QLatin1Char(']');
+        } else if (text.mid(i, 2) == QLatin1String("--") || text.mid(i, 2) == QLatin1String("/*")) {
+            return false;
         } else if (c == QLatin1Char(';') && !text.mid(i + 1).trimmed().isEmpty()) {
             return false;
         }

@@ -205,14 +205,17 @@ private Q_SLOTS:
             QVERIFY(!rowsOf(*source, QStringLiteral("SELECT * FROM ") + table).isEmpty());
             for (const QString &statement :
                  {QStringLiteral("DELETE FROM ") + table, QStringLiteral("SELECT 1; DELETE FROM ") + table,
-                  QStringLiteral("  update ") + table + QStringLiteral(" SET x = 1")}) {
+                  QStringLiteral("  update ") + table + QStringLiteral(" SET x = 1"),
+                  // A quote mark in a comment must not hide the ";" that follows it.
+                  QStringLiteral("SELECT 1 -- it's\n; DELETE FROM ") + table,
+                  QStringLiteral("SELECT 1 /* it's */; DELETE FROM ") + table}) {
                 const auto refused = source->select(statement);
                 QVERIFY(!refused);
                 QVERIFY(refused.status().description().contains(QStringLiteral("SELECT")));
             }
-            // A ";" inside a quoted text is part of the text.
+            // A ";" or a comment mark inside a quoted text is part of the text.
             QVERIFY(source->select(QStringLiteral("SELECT * FROM ") + table +
-                                   QStringLiteral(" WHERE 'a;b' = 'c'")));
+                                   QStringLiteral(" WHERE 'a;b--/*' = 'c'")));
             // Even past the guard the database file does not take a change.
             QSqlQuery direct(source->database());
             if (!file.endsWith(QLatin1String(".db")))
