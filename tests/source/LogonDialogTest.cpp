@@ -31,9 +31,11 @@ struct ShownBox
     int count = 0;
 };
 
-void closeBoxesAsTheyAppear(ShownBox &shown)
+// Watches for the first box. The watch also ends with `owner`, so a box that never came leaves
+// no timer behind to write into `shown` after it is gone.
+void closeBoxesAsTheyAppear(QObject *owner, ShownBox &shown)
 {
-    auto *timer = new QTimer(qApp);
+    auto *timer = new QTimer(owner);
     QObject::connect(timer, &QTimer::timeout, timer, [&shown, timer] {
         if (auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget())) {
             shown.text = box->text();
@@ -139,12 +141,12 @@ private Q_SLOTS:
         const ConnectionParams demo = fileConnection(copyDemoDatabase(folder.path()));
         MemorySettingsStore store;
         ConnectionParams params;
+        ShownBox shown;
         frmLogon dialog(store, params);
         typeInto(dialog, "txtConnServer", demo.server);
         typeInto(dialog, "txtConnDatabase", demo.database);
         child<QComboBox>(dialog, "CmbConnType")->setCurrentIndex(2);
-        ShownBox shown;
-        closeBoxesAsTheyAppear(shown);
+        closeBoxesAsTheyAppear(&dialog, shown);
         QTest::mouseClick(child<QPushButton>(dialog, "CmdCheck"), Qt::LeftButton);
         QCOMPARE(child<QLabel>(dialog, "LblMsg")->text(), QStringLiteral("הבדיקה הסתיימה בהצלחה"));
         QCOMPARE(shown.count, 0);
