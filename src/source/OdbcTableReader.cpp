@@ -39,6 +39,17 @@ QString diagnostics(SQLSMALLINT handleType, SQLHANDLE handle)
     return lines.join(QLatin1Char('\n'));
 }
 
+// What a failure says when the driver gave no words of its own.
+QString cannotListTables()
+{
+    return QStringLiteral("לא ניתן לקרוא את רשימת הטבלאות.");
+}
+
+QString cannotReadTable(const QString &table)
+{
+    return QStringLiteral("לא ניתן לקרוא את הטבלה %1.").arg(table);
+}
+
 Status failure(SQLSMALLINT handleType, SQLHANDLE handle, const QString &whenEmpty)
 {
     const QString text = diagnostics(handleType, handle);
@@ -181,14 +192,18 @@ Result<QStringList> OdbcTableReader::tableNames()
 {
     Statement statement(m_handles->connection);
     if (!statement.isValid())
-        return failure(SQL_HANDLE_DBC, m_handles->connection,
-                       QStringLiteral("לא ניתן לקרוא את רשימת הטבלאות."));
+        return failure(SQL_HANDLE_DBC, m_handles->connection, cannotListTables());
     SQLCHAR tableType[] = "TABLE";
     if (!SQL_SUCCEEDED(SQLTables(statement.handle(), nullptr, 0, nullptr, 0, nullptr, 0, tableType, SQL_NTS)))
-        return failure(SQL_HANDLE_STMT, statement.handle(),
-                       QStringLiteral("לא ניתן לקרוא את רשימת הטבלאות."));
+        return failure(SQL_HANDLE_STMT, statement.handle(), cannotListTables());
     QStringList names;
-    while (SQL_SUCCEEDED(SQLFetch(statement.handle()))) {
+    for (;;) {
+        const SQLRETURN fetched = SQLFetch(statement.handle());
+        if (fetched == SQL_NO_DATA)
+            break;
+        // Stopping quietly would pass a table left unlisted off as one the file does not have.
+        if (!SQL_SUCCEEDED(fetched))
+            return failure(SQL_HANDLE_STMT, statement.handle(), cannotListTables());
         auto name = readValue(statement.handle(), 3, ColumnKind::Text); // TABLE_NAME
         if (!name)
             return name.status();
@@ -209,14 +224,13 @@ Status OdbcTableReader::readTable(const QString &table,
 {
     Statement statement(m_handles->connection);
     if (!statement.isValid())
-        return failure(SQL_HANDLE_DBC, m_handles->connection,
-                       QStringLiteral("לא ניתן לקרוא את הטבלה %1.").arg(table));
+        return failure(SQL_HANDLE_DBC, m_handles->connection, cannotReadTable(table));
     QByteArray sql = QStringLiteral("SELECT * FROM [%1]").arg(table).toLocal8Bit();
     if (!SQL_SUCCEEDED(SQLExecDirect(statement.handle(), reinterpret_cast<SQLCHAR *>(sql.data()), SQL_NTS)))
-        return failure(SQL_HANDLE_STMT, statement.handle(),
-                       QStringLiteral("לא ניתן לקרוא את הטבלה %1.").arg(table));
+        return failure(SQL_HANDLE_STMT, statement.handle(), cannotReadTable(table));
     SQLSMALLINT count = 0;
-    SQLNumResultCols(statement.handle(), &count);
+    if (!SQL_SUCCEEDED(SQLNumResultCols(statement.handle(), &count)))
+        return failure(SQL_HANDLE_STMT, statement.handle(), cannotReadTable(table));
     QList<Column> described;
     for (SQLUSMALLINT i = 1; i <= count; ++i) {
         SQLCHAR name[NameBufferSize] = {};
@@ -227,8 +241,7 @@ Status OdbcTableReader::readTable(const QString &table,
         SQLSMALLINT nullable = 0;
         if (!SQL_SUCCEEDED(SQLDescribeCol(statement.handle(), i, name, NameBufferSize, &nameLength, &sqlType,
                                           &size, &decimals, &nullable)))
-            return failure(SQL_HANDLE_STMT, statement.handle(),
-                           QStringLiteral("לא ניתן לקרוא את הטבלה %1.").arg(table));
+            return failure(SQL_HANDLE_STMT, statement.handle(), cannotReadTable(table));
         described << Column{fromDriver(name), kindOf(sqlType)};
     }
     if (Status status = columns(described); !status)
@@ -238,8 +251,7 @@ Status OdbcTableReader::readTable(const QString &table,
         if (fetched == SQL_NO_DATA)
             break;
         if (!SQL_SUCCEEDED(fetched))
-            return failure(SQL_HANDLE_STMT, statement.handle(),
-                           QStringLiteral("לא ניתן לקרוא את הטבלה %1.").arg(table));
+            return failure(SQL_HANDLE_STMT, statement.handle(), cannotReadTable(table));
         QVariantList values;
         values.reserve(count);
         for (SQLUSMALLINT i = 1; i <= count; ++i) {
