@@ -26,27 +26,41 @@ bool isSqlServerProvider(const QString &provider)
     return false;
 }
 
-// One SELECT statement: it starts with SELECT, no ";" outside a quoted text or name is
-// followed by anything but blanks, and there is no comment outside one. A second statement
-// could change the accounting data. Our statements have no comments, and a quote mark inside
-// one would make the rest look quoted here while the server reads it as statements (servers
-// do not even agree on where a nested comment ends), so a comment is refused, not skipped.
+// Whether a line comment ends at `c`. Any line break counts, even where a server reads on:
+// ending too early only makes the guard below stricter, never blind.
+bool endsLineComment(QChar c)
+{
+    return c == QLatin1Char('\n') || c == QLatin1Char('\r') || c == QLatin1Char('\v') ||
+           c == QLatin1Char('\f') || c == QChar(0x85) || c == QChar(QChar::LineSeparator) ||
+           c == QChar(QChar::ParagraphSeparator);
+}
+
+// One SELECT statement: it starts with SELECT, and no ";" outside a quoted text, a quoted name
+// or a "--" comment is followed by anything but blanks. A second statement could change the
+// accounting data. A quote mark inside a comment quotes nothing. A block comment is refused:
+// servers do not agree on whether one nests, so where it ends cannot be known here.
 bool isSingleSelect(const QString &sql)
 {
     const QString text = sql.trimmed();
     if (!text.startsWith(QLatin1String("SELECT"), Qt::CaseInsensitive))
         return false;
-    QChar closing; // the mark that ends the quoted text or name we are in, or none
+    QChar closing;            // the mark that ends the quoted text or name we are in, or none
+    bool lineComment = false; // inside a "--" comment
     for (qsizetype i = 0; i < text.size(); ++i) {
         const QChar c = text.at(i);
-        if (!closing.isNull()) {
+        if (lineComment) {
+            lineComment = !endsLineComment(c);
+        } else if (!closing.isNull()) {
             if (c == closing)
                 closing = QChar(); // a doubled mark closes and reopens: the same result
         } else if (c == QLatin1Char('\'') || c == QLatin1Char('"')) {
             closing = c;
         } else if (c == QLatin1Char('[')) {
             closing = QLatin1Char(']');
-        } else if (text.mid(i, 2) == QLatin1String("--") || text.mid(i, 2) == QLatin1String("/*")) {
+        } else if (text.mid(i, 2) == QLatin1String("--")) {
+            lineComment = true;
+            ++i;
+        } else if (text.mid(i, 2) == QLatin1String("/*")) {
             return false;
         } else if (c == QLatin1Char(';') && !text.mid(i + 1).trimmed().isEmpty()) {
             return false;

@@ -208,6 +208,7 @@ private Q_SLOTS:
                   QStringLiteral("  update ") + table + QStringLiteral(" SET x = 1"),
                   // A quote mark in a comment must not hide the ";" that follows it.
                   QStringLiteral("SELECT 1 -- it's\n; DELETE FROM ") + table,
+                  QStringLiteral("SELECT 1 -- it's\r; DELETE FROM ") + table,
                   QStringLiteral("SELECT 1 /* it's */; DELETE FROM ") + table}) {
                 const auto refused = source->select(statement);
                 QVERIFY(!refused);
@@ -216,6 +217,8 @@ private Q_SLOTS:
             // A ";" or a comment mark inside a quoted text is part of the text.
             QVERIFY(source->select(QStringLiteral("SELECT * FROM ") + table +
                                    QStringLiteral(" WHERE 'a;b--/*' = 'c'")));
+            // A line comment quotes nothing, nor does a quote mark inside it.
+            QVERIFY(source->select(QStringLiteral("SELECT * FROM ") + table + QStringLiteral(" -- it's;")));
             // Even past the guard the database file does not take a change.
             QSqlQuery direct(source->database());
             if (!file.endsWith(QLatin1String(".db")))
