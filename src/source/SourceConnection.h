@@ -41,9 +41,10 @@ public:
     SourceConnection(const SourceConnection &) = delete;
     SourceConnection &operator=(const SourceConnection &) = delete;
 
-    // Runs one SELECT statement (anything else is refused, a second statement after ";" too);
-    // its rows are read forward from the first, fields by name or position, a Null as a null
-    // QVariant. The query must be destroyed before the connection.
+    // Runs one SELECT statement; anything else is refused, and so are a second statement after
+    // ";" and a block comment (servers differ on where one ends). Its rows are read forward
+    // from the first, fields by name or position, a Null as a null QVariant. The query must be
+    // destroyed before the connection.
     Result<QSqlQuery> select(const QString &sql);
 
     // The database the statements run on (for a Jet file, the in-memory copy of its tables).
