@@ -2,14 +2,16 @@
 
 #include <QLocale>
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cmath>
+#include <limits>
 
 namespace zorbin {
 namespace {
 
-// Above this a double no longer holds every cent exactly; such amounts are printed as they are.
-constexpr double ExactCentsLimit = 1e13;
+// The digits of a double that are the digits of the number it was made from (DBL_DIG).
+constexpr int SignificantDigits = std::numeric_limits<double>::digits10;
 
 // The date separator of a locale's short date format: the first mark between its fields.
 QString dateSeparatorOf(const QLocale &locale)
@@ -20,36 +22,6 @@ QString dateSeparatorOf(const QLocale &locale)
             return c;
     }
     return {};
-}
-
-// The whole cents of a magnitude below ExactCentsLimit, a half cent rounded up. The half is
-// judged on the fifteen significant digits that a double holds faithfully, as the amount was
-// typed: 1.005 is stored as 1.00499999999999989... and must still give 101 cents.
-long long roundedCents(double magnitude)
-{
-    char text[32];
-    const char *const end =
-        std::to_chars(text, text + sizeof text, magnitude, std::chars_format::scientific, 14).ptr;
-    long long digits = 0; // the fifteen digits of "d.dddddddddddddde±x", without the point
-    const char *c = text;
-    for (; c != end && *c != 'e'; ++c) {
-        if (*c != '.')
-            digits = digits * 10 + (*c - '0');
-    }
-    int exponent = 0;
-    std::from_chars(*(c + 1) == '+' ? c + 2 : c + 1, end, exponent);
-    // cents = digits x 10^(exponent - 12); the power is positive only for an amount that
-    // rounds up to the limit itself.
-    int dropped = 12 - exponent;
-    for (; dropped < 0; ++dropped)
-        digits *= 10;
-    if (dropped > 15)
-        return 0;
-    long long divisor = 1;
-    for (int i = 0; i < dropped; ++i)
-        divisor *= 10;
-    const long long cents = digits / divisor;
-    return digits % divisor * 2 >= divisor ? cents + 1 : cents;
 }
 
 } // namespace
@@ -73,35 +45,59 @@ QString formatAmount(double value, const Separators &separators)
 {
     if (!std::isfinite(value))
         return QString::number(value);
-    // Digits by hand rather than through QString::arg: a catalog formats a price in every cell.
-    char digits[32];
-    char *digitsEnd = digits;
-    int cents = 0;
-    bool negative = false;
-    if (std::fabs(value) < ExactCentsLimit) {
-        const long long all = roundedCents(std::fabs(value));
-        negative = value < 0 && all != 0;
-        digitsEnd = std::to_chars(digits, digits + sizeof digits, all / 100).ptr;
-        cents = static_cast<int>(all % 100);
-    } else {
-        negative = value < 0;
-        const QByteArray fixed = QByteArray::number(std::fabs(value), 'f', 2);
-        digitsEnd = std::copy(fixed.begin(), fixed.end() - 3, digits);
-        cents = (fixed.at(fixed.size() - 2) - '0') * 10 + (fixed.at(fixed.size() - 1) - '0');
+    // The value to 15 significant digits, "d.dddddddddddddde+x": the double nearest to a typed
+    // half cent lies a hair below or above it (2.675 is stored as 2.67499999...), and at these
+    // digits it is the half again, rounded as a half.
+    char scientific[32];
+    const char *const scientificEnd =
+        std::to_chars(scientific, scientific + sizeof scientific, std::fabs(value),
+                      std::chars_format::scientific, SignificantDigits - 1)
+            .ptr;
+    const char *exponentText = scientific + SignificantDigits + 2;
+    if (*exponentText == '+')
+        ++exponentText;
+    int exponent = 0;
+    std::from_chars(exponentText, scientificEnd, exponent);
+    // The significant digit whose place value is 10 to the given power, 0 beyond them.
+    const auto digitAt = [&](int power) {
+        const int index = exponent - power;
+        if (index < 0 || index >= SignificantDigits)
+            return '0';
+        return scientific[index == 0 ? 0 : index + 1];
+    };
+
+    // The digits from the highest place (at least the units) down to the cents, with room for
+    // a carry into a new highest place.
+    std::array<char, std::numeric_limits<double>::max_exponent10 + 5> digits;
+    char *const first = digits.data() + 1;
+    char *last = first;
+    for (int power = std::max(exponent, 0); power >= -2; --power)
+        *last++ = digitAt(power);
+    char *begin = first;
+    if (digitAt(-3) >= '5') { // a half cent or more: away from zero
+        char *digit = last;
+        while (digit != first && *(digit - 1) == '9')
+            *--digit = '0';
+        if (digit == first)
+            *--begin = '1';
+        else
+            ++*(digit - 1);
     }
-    const qsizetype count = digitsEnd - digits;
+    const qsizetype wholeCount = (last - begin) - 2;
+    const bool negative = value < 0 && std::any_of(begin, last, [](char d) { return d != '0'; });
+
     QString text;
-    text.reserve(count + count / 3 * separators.group.size() + separators.decimal.size() + 3);
+    text.reserve(wholeCount + wholeCount / 3 * separators.group.size() + separators.decimal.size() + 3);
     if (negative)
         text += QLatin1Char('-');
-    for (qsizetype i = 0; i < count; ++i) {
-        if (i > 0 && (count - i) % 3 == 0)
+    for (qsizetype i = 0; i < wholeCount; ++i) {
+        if (i > 0 && (wholeCount - i) % 3 == 0)
             text += separators.group;
-        text += QLatin1Char(digits[i]);
+        text += QLatin1Char(begin[i]);
     }
     text += separators.decimal;
-    text += QLatin1Char(static_cast<char>('0' + cents / 10));
-    text += QLatin1Char(static_cast<char>('0' + cents % 10));
+    text += QLatin1Char(begin[wholeCount]);
+    text += QLatin1Char(begin[wholeCount + 1]);
     return text;
 }
 

@@ -20,9 +20,10 @@ struct Separators
 };
 
 // A number with the pattern "###,##0.00": thousands grouped, at least one digit before the
-// decimal mark, exactly two after it, a half cent rounded away from zero as the amount reads in
-// decimal (1234.5 gives "1,234.50", 1.005 gives "1.01", 0 gives "0.00", -3 gives "-3.00"; a
-// value that rounds to zero has no sign).
+// decimal mark, exactly two after it, a half cent rounded away from zero (1234.5 gives
+// "1,234.50", 0 gives "0.00", -3 gives "-3.00"; a value that rounds to zero has no sign).
+// The value is rounded from its first 15 significant digits, the digits it was typed with, so
+// that a typed half cent rounds as a half (2.675 gives "2.68"); any magnitude is written out.
 QString formatAmount(double value, const Separators &separators);
 
 // A date with the pattern "dd/mm/yyyy": two-digit day, two-digit month, four-digit year.

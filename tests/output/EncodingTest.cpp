@@ -9,6 +9,7 @@
 #include <QLocale>
 #include <QTemporaryDir>
 #include <QTest>
+#include <limits>
 #include <unicode/ucnv.h>
 #include <unicode/ucnv_cb.h>
 
@@ -256,6 +257,19 @@ private Q_SLOTS:
         QTest::newRow("rounds up to a thousand") << 999.999 << QStringLiteral("1,000.00");
         QTest::newRow("tiny negative has no sign") << -0.001 << QStringLiteral("0.00");
         QTest::newRow("huge") << 123456789012345.0 << QStringLiteral("123,456,789,012,345.00");
+        // Typed half cents whose doubles lie a hair below the half.
+        QTest::newRow("typed half cent") << 2.675 << QStringLiteral("2.68");
+        QTest::newRow("typed half cent below one") << 0.285 << QStringLiteral("0.29");
+        QTest::newRow("typed half cent with carry") << 1.005 << QStringLiteral("1.01");
+        QTest::newRow("negative typed half cent") << -2.675 << QStringLiteral("-2.68");
+        QTest::newRow("just below a half cent") << 0.0049999999 << QStringLiteral("0.00");
+        // A corrupt price far beyond any amount of money is printed, not overrun.
+        QTest::newRow("beyond every price") << -1e40
+                                            << QStringLiteral("-10,000,000,000,000,000,000,000,000,000,000,"
+                                                              "000,000,000.00");
+        QTest::newRow("largest double") << std::numeric_limits<double>::max()
+                                        << QStringLiteral("179,769,313,486,232") +
+                                               QStringLiteral(",000").repeated(98) + QStringLiteral(".00");
     }
 
     void amounts()
