@@ -23,15 +23,15 @@ Status writeFailure(const QString &path, const QString &reason)
 
 Result<std::unique_ptr<Windows1255Writer>> Windows1255Writer::create(FileSystem &files, const QString &path)
 {
+    // Without the converter the old file would be replaced by an empty one.
+    if (!Windows1255Encoder().isValid())
+        return writeFailure(path, QStringLiteral("הממיר windows-1255 של ICU חסר במערכת"));
     if (const Status removed = files.removeFile(path); !removed)
         return removed;
     auto device = files.openForWriting(path);
     if (!device)
         return device.status();
-    std::unique_ptr<Windows1255Writer> writer(new Windows1255Writer(std::move(device).value(), path));
-    if (!writer->m_encoder.isValid())
-        return writeFailure(path, QStringLiteral("הממיר windows-1255 של ICU חסר במערכת"));
-    return writer;
+    return std::unique_ptr<Windows1255Writer>(new Windows1255Writer(std::move(device).value(), path));
 }
 
 Windows1255Writer::Windows1255Writer(std::unique_ptr<QIODevice> device, QString path)
