@@ -34,18 +34,21 @@ public:
     {
         if (m_rows.count() == 0)
             return QString();
-        if (const Status status = writePages(); !status) {
+        const Result<Stop> written = writePages();
+        if (!written) {
             (void)abandon(); // the first failure is the one to report
-            return status;
+            return written.status();
         }
-        m_meter.reset();
+        // After a stop the bar stays where the writing stopped.
+        if (written.value() == Stop::No)
+            m_meter.reset();
         return m_firstPage;
     }
 
 private:
     enum class Stop { No, Requested };
 
-    Status writePages()
+    Result<Stop> writePages()
     {
         m_hasItem = m_rows.next();
         if (!m_rows.status())
@@ -62,8 +65,11 @@ private:
             auto stop = writeGrid();
             if (!stop)
                 return stop.status();
-            if (stop.value() == Stop::Requested)
-                return abandon();
+            if (stop.value() == Stop::Requested) {
+                if (const Status closed = abandon(); !closed)
+                    return closed;
+                return Stop::Requested;
+            }
             if (m_layout.bottomPercent > 0)
                 writeBottomBand(*m_file, m_layout, m_prefix, page, m_pageCount);
             writeOuterTableEnd(*m_file);
@@ -77,7 +83,7 @@ private:
                 return failed;
             }
         }
-        return Status::ok();
+        return Stop::No;
     }
 
     Status openPage(long long page)
@@ -109,6 +115,7 @@ private:
             for (int column = 1; column <= m_layout.grid.columns; ++column) {
                 m_file->writeLine(u"    <td class=D1>");
                 m_file->writeLine(u"     <table>");
+                m_cellOpen = true;
                 if (m_hasItem) {
                     if (const Status written = m_cell.write(*m_file); !written)
                         return written;
@@ -118,8 +125,7 @@ private:
                 } else {
                     writeEmptyCellLines(*m_file);
                 }
-                m_file->writeLine(u"     </table>");
-                m_file->writeLine(u"    </td>");
+                writeCellEnd();
                 ++m_cellsDone;
                 if (m_meter.tick(m_cellsDone, m_cellCount))
                     return Stop::Requested;
@@ -130,12 +136,21 @@ private:
         return Stop::No;
     }
 
-    // Ends the open page where it stands: closes its grid row, its outer table and the
-    // document, so that the file is a whole page.
+    void writeCellEnd()
+    {
+        m_file->writeLine(u"     </table>");
+        m_file->writeLine(u"    </td>");
+        m_cellOpen = false;
+    }
+
+    // Ends the open page where it stands: closes its grid cell and row, its outer table and
+    // the document, so that the file is a whole page.
     Status abandon()
     {
         if (!m_file)
             return Status::ok();
+        if (m_cellOpen)
+            writeCellEnd();
         if (m_rowOpen)
             m_file->writeLine(u"  </tr>");
         if (m_tableOpen)
@@ -159,6 +174,7 @@ private:
     long long m_cellsDone = 0;
     bool m_hasItem = false;
     std::unique_ptr<Windows1255Writer> m_file;
+    bool m_cellOpen = false; // a cell's own table holds the item's lines
     bool m_rowOpen = false;
     bool m_tableOpen = false;
     QString m_firstPage;

@@ -150,7 +150,8 @@ private Q_SLOTS:
                         .endsWith("</table>\r\n</BODY>\r\n</HTML>\r\n"));
             QVERIFY(!QFile::exists(out(QStringLiteral("zo000003.htm"))));
         }
-        QCOMPARE(output.user.fillWidth, 0);
+        // The bar stays where the writing stopped: 5 of 8 cells.
+        QCOMPARE(output.user.widths, (QList<int>{0, 625}));
     }
 
     void noSixteenBitLimits()
@@ -222,6 +223,36 @@ private Q_SLOTS:
         QVERIFY(!first.isOk());
         QVERIFY(first.status().description().contains(out(QStringLiteral("zo000002.htm"))));
         QVERIFY(test::readFile(out(QStringLiteral("zoindex.htm"))).endsWith("</BODY>\r\n</HTML>\r\n"));
+    }
+
+    void priceThatIsNotANumberLeavesAWholePage()
+    {
+        // The schema keeps text out of a price column; a damaged file (here a price list
+        // without types) does not.
+        const QString db = m_dir.filePath(QStringLiteral("bad-price.db"));
+        QVERIFY(makeItems(db, 3).isOk());
+        {
+            auto work = WorkDatabase::open(db);
+            QVERIFY(work.isOk());
+            for (const char *sql :
+                 {"DROP TABLE tItemPrice1", "CREATE TABLE tItemPrice1 (ItemKey, Coin, Price)",
+                  "INSERT INTO tItemPrice1 VALUES ('K0000001', '$', 1), ('K0000002', '$', 'abc')"}) {
+                const WriteOutcome done = work.value()->exec(QString::fromLatin1(sql));
+                QVERIFY2(done.isOk(), qPrintable(done.description()));
+            }
+        }
+        test::OutputContext output;
+        prepare(output, false);
+        output.settings.lines[2].tag = QStringLiteral("4");
+        const auto first = pages(output, db);
+        QVERIFY(!first.isOk());
+        QVERIFY(first.status().description().contains(QStringLiteral("abc")));
+        // The failure comes within the second item's cell, after its first lines.
+        const QByteArray page = test::readFile(out(QStringLiteral("zoindex.htm")));
+        QVERIFY(page.contains("K0000002"));
+        QVERIFY(page.endsWith("</table>\r\n</BODY>\r\n</HTML>\r\n"));
+        for (const char *element : {"table", "tr", "td"})
+            QVERIFY2(isBalanced(page, element), element);
     }
 
     void listStopsAsAWholePage()
