@@ -142,8 +142,8 @@ Totals runCollection(const char *label, CatalogSettings &settings, ConnectionPar
                 totals.rows / totals.seconds);
     cpu.stop(totals);
     printCpu(totals);
-    std::printf("  events handled %d times at %d progress points: %.2f s\n", clock.eventRounds(), clock.yields(),
-                clock.yieldSeconds());
+    std::printf("  events handled %d times at %d progress points: %.2f s\n", clock.eventRounds(),
+                clock.yields(), clock.yieldSeconds());
     return totals;
 }
 

@@ -108,7 +108,8 @@ const QByteArray &ItemCell::pictureElement(const QVariant &value)
     if (const auto known = m_pictures.constFind(reference); known != m_pictures.cend())
         return known.value();
     const QString file = m_layout.filePerPage ? ImageFileName(m_imagesFolder, reference) : reference;
-    QString element = QStringLiteral("<img src='") + attributeFileReference(file) + QStringLiteral("' border=0");
+    QString element =
+        QStringLiteral("<img src='") + attributeFileReference(file) + QStringLiteral("' border=0");
     if (m_layout.pictureSizes())
         element += m_sizes.sizeAttr(file, m_layout.imageWidth, m_layout.imageHeight);
     element += QStringLiteral(">\r\n");

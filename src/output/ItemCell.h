@@ -35,9 +35,9 @@ private:
     // One used line, ready to write.
     struct Line
     {
-        int value = -1;     // the rows' column of the field
-        int coin = -1;      // prices only: the column of the currency
-        QByteArray start;   // from the row to the opening tag of the value's cell
+        int value = -1;              // the rows' column of the field
+        int coin = -1;               // prices only: the column of the currency
+        QByteArray start;            // from the row to the opening tag of the value's cell
         QByteArray startLeftToRight; // texts without a Hebrew letter: the same, read left to right
     };
 
@@ -50,7 +50,7 @@ private:
     QString m_imagesFolder;
     ImageSizes &m_sizes;
     Separators m_separators;
-    std::vector<Line> m_lines; // one per used line
+    std::vector<Line> m_lines;             // one per used line
     QHash<QString, QByteArray> m_pictures; // the image element of each picture reference
 };
 

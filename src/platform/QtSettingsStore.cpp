@@ -89,7 +89,8 @@ private:
         if (QFile::exists(fileName) || !QDir().mkpath(QFileInfo(fileName).absolutePath()))
             return;
         QFile file(fileName);
-        (void)file.open(QIODevice::WriteOnly | QIODevice::NewOnly, QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        (void)file.open(QIODevice::WriteOnly | QIODevice::NewOnly,
+                        QFileDevice::ReadOwner | QFileDevice::WriteOwner);
 #else
         Q_UNUSED(fileName);
 #endif

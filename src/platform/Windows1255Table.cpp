@@ -43,7 +43,8 @@ std::unique_ptr<Windows1255Table> buildTable()
     auto table = std::make_unique<Windows1255Table>();
     table->bmp.resize(0x10000);
     for (char32_t code = 0; code < 0x10000; ++code)
-        table->bmp[code] = QChar::isSurrogate(code) ? Windows1255Table::Reference : converted(converter, code);
+        table->bmp[code] =
+            QChar::isSurrogate(code) ? Windows1255Table::Reference : converted(converter, code);
     for (const auto &range : LeftRanges) {
         for (char32_t code = range[0]; code <= range[1]; ++code) {
             if (converted(converter, code) == Windows1255Table::Left)

@@ -14,7 +14,7 @@ struct Windows1255Table
     static constexpr std::uint16_t Left = 0x200;      // nothing: ICU leaves out such a character
                                                       // when it is "default ignorable" (U+200B)
 
-    std::vector<std::uint16_t> bmp; // one entry for each of U+0000 to U+FFFF; surrogates Reference
+    std::vector<std::uint16_t> bmp;     // one entry for each of U+0000 to U+FFFF; surrogates Reference
     std::vector<char32_t> leftAboveBmp; // in order
 
     // Reference or Left for a character above U+FFFF (the code page has none of them).

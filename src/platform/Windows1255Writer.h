@@ -15,9 +15,9 @@ class FileSystem;
 // A text file of the catalog, written line by line in windows-1255, every line ended by
 // carriage return and line feed (see Windows1255Encoder for characters the code page lacks).
 //
-// Text is encoded as it comes and the bytes handed to the file in large blocks. The first failure to write is kept and every later write is dropped;
-// close() reports it. A writer destroyed without close() writes what it holds and closes the
-// file, ignoring failures.
+// Text is encoded as it comes and the bytes handed to the file in large blocks. The first failure to write is
+// kept and every later write is dropped; close() reports it. A writer destroyed without close() writes what
+// it holds and closes the file, ignoring failures.
 class Windows1255Writer
 {
 public:

@@ -1,8 +1,8 @@
 #include "source/LogonForm.h"
 
 #include "control/SettingsPersistence.h"
-#include "source/ConnectionStore.h"
 #include "platform/SettingsStore.h"
+#include "source/ConnectionStore.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 

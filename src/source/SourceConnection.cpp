@@ -76,7 +76,8 @@ Result<std::unique_ptr<SourceConnection>> SourceConnection::open(const QString &
     if (connectionString.isEmpty())
         return Status::fault(noConnectionTypeFault());
 
-    std::unique_ptr<SourceConnection> connection(new SourceConnection(uniqueConnectionName(QStringLiteral("source"))));
+    std::unique_ptr<SourceConnection> connection(
+        new SourceConnection(uniqueConnectionName(QStringLiteral("source"))));
     Status opened;
     if (!isOleDbConnString(connectionString)) {
         opened = connection->openOdbc(connectionString);
