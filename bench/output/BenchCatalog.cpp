@@ -1,6 +1,6 @@
 #include "BenchCatalog.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "platform/FileSystem.h"
 #include "workdb/RowWriter.h"
 #include "workdb/WorkDatabase.h"

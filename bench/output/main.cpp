@@ -7,15 +7,15 @@
 #include "BenchCatalog.h"
 #include "CountingFileSystem.h"
 #include "MemoryUse.h"
-#include "control/CatalogSettings.h"
-#include "control/OutputFolder.h"
-#include "control/RunContext.h"
-#include "control/RunState.h"
-#include "control/UserPort.h"
+#include "model/CatalogSettings.h"
+#include "output/OutputFolder.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
+#include "model/UserPort.h"
 #include "output/CatalogPages.h"
 #include "output/ImageCollection.h"
 #include "output/Stylesheet.h"
-#include "source/ConnectionParams.h"
+#include "model/ConnectionParams.h"
 
 #include <QCommandLineParser>
 #include <QCoreApplication>

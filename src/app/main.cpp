@@ -1,14 +1,14 @@
 // zorbin: the desktop program, a window that hosts the catalog control.
 #include "card/CardWindow.h"
 #include "platform/SettingsStore.h"
-#include "workdb/SqliteEngine.h"
+#include "control/Program.h"
 
 #include <QApplication>
 #include <QIcon>
 
 int main(int argc, char *argv[])
 {
-    zorbin::setUpSqliteEngine();
+    zorbin::prepareProcess();
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Zorbin"));
     QApplication::setApplicationDisplayName(QStringLiteral("זורבין"));

@@ -10,7 +10,7 @@
 #include "card/tabs/PageSetupTab.h"
 #include "card/tabs/RangeTab.h"
 #include "card/tabs/TitlesTab.h"
-#include "dialogs/CellLineEditor.h"
+#include "card/CellLineEditor.h"
 #include "platform/FileSystem.h"
 
 #include <QHBoxLayout>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "control/CatalogSettings.h"
-#include "control/SettingsValidation.h"
+#include "model/CatalogSettings.h"
+#include "model/SettingsValidation.h"
 
 #include <QObject>
 #include <functional>

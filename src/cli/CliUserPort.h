@@ -1,6 +1,6 @@
 #pragma once
 
-#include "control/UserPort.h"
+#include "model/UserPort.h"
 
 #include <QTextStream>
 

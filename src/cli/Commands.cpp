@@ -2,8 +2,9 @@
 
 #include "cli/CliUserPort.h"
 #include "cli/DemoFiles.h"
-#include "cli/Statements.h"
+#include "control/Statements.h"
 #include "control/CatalogControl.h"
+#include "control/Program.h"
 #include "platform/Browser.h"
 #include "platform/FileSystem.h"
 #include "platform/SettingsStore.h"
@@ -16,6 +17,7 @@
 
 namespace zorbin::cli {
 namespace {
+
 
 QTextStream &out()
 {

@@ -1,7 +1,5 @@
 #include "cli/DemoFiles.h"
 
-#include "workdb/WorkDatabasePath.h"
-
 #include <QCoreApplication>
 #include <QDir>
 #include <QFileInfo>
@@ -27,12 +25,6 @@ Result<DemoFiles> findDemoFiles()
     return Status::fault(QStringLiteral("The demo database was not found (looked in: %1). Build the project "
                                         "first, or set ZORBIN_DEMO_DIR to the folder that holds %2.")
                              .arg(candidates.join(QStringLiteral(", ")), DemoSettingsName));
-}
-
-QString lastWorkDatabase()
-{
-    const QString path = workDatabasePath();
-    return QFileInfo(path).isFile() ? path : QString();
 }
 
 } // namespace zorbin::cli

@@ -16,7 +16,4 @@ struct DemoFiles
 // Looks for the demo in ZORBIN_DEMO_DIR, the build tree, then the installed data folder.
 Result<DemoFiles> findDemoFiles();
 
-// The working database the last collection of this user left, or the empty text.
-QString lastWorkDatabase();
-
 } // namespace zorbin::cli

@@ -1,6 +1,6 @@
 // zorbin-cli: the catalog runs without a window.
 #include "cli/Commands.h"
-#include "workdb/SqliteEngine.h"
+#include "control/Program.h"
 
 #include <QCoreApplication>
 #include <QTextStream>
@@ -8,7 +8,7 @@
 
 int main(int argc, char *argv[])
 {
-    zorbin::setUpSqliteEngine();
+    zorbin::prepareProcess();
     QCoreApplication app(argc, argv);
     QCoreApplication::setApplicationName(QStringLiteral("zorbin-cli"));
     QCoreApplication::setApplicationVersion(QStringLiteral(ZORBIN_VERSION));

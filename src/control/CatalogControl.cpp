@@ -1,9 +1,9 @@
 #include "control/CatalogControl.h"
 
-#include "control/OutputFolder.h"
-#include "control/SettingsValidation.h"
+#include "output/OutputFolder.h"
+#include "model/SettingsValidation.h"
 #include "control/StandardStages.h"
-#include "control/UserPort.h"
+#include "model/UserPort.h"
 #include "platform/FileSystem.h"
 
 namespace zorbin {

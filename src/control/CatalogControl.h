@@ -1,12 +1,12 @@
 #pragma once
 
 #include "common/Status.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "control/CatalogStages.h"
-#include "control/RunContext.h"
-#include "control/RunState.h"
-#include "control/SettingsPersistence.h"
-#include "source/ConnectionParams.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
+#include "model/SettingsPersistence.h"
+#include "model/ConnectionParams.h"
 
 #include <functional>
 #include <memory>

@@ -25,8 +25,21 @@ QString BuildItemListSQL(bool onlyMarked)
     return sql;
 }
 
-Result<QVector<SelectableItem>> readSelectableItems(WorkDatabase &database, bool onlyMarked)
+Result<std::unique_ptr<MarkedItems>> MarkedItems::open(const QString &workDbFile)
 {
+    auto opened = WorkDatabase::open(workDbFile);
+    if (!opened)
+        return opened.status();
+    return std::unique_ptr<MarkedItems>(new MarkedItems(std::move(opened).value()));
+}
+
+MarkedItems::MarkedItems(std::unique_ptr<WorkDatabase> database) : m_database(std::move(database)) {}
+
+MarkedItems::~MarkedItems() = default;
+
+Result<QVector<SelectableItem>> MarkedItems::read(bool onlyMarked)
+{
+    WorkDatabase &database = *m_database;
     auto query = database.select(BuildItemListSQL(onlyMarked));
     if (!query)
         return query.status();
@@ -39,8 +52,9 @@ Result<QVector<SelectableItem>> readSelectableItems(WorkDatabase &database, bool
     return items;
 }
 
-Status writeItemMarks(WorkDatabase &database, const QStringList &keys, bool include)
+Status MarkedItems::write(const QStringList &keys, bool include)
 {
+    WorkDatabase &database = *m_database;
     const bool batch = keys.size() > 1 && !database.inTransaction();
     if (batch) {
         if (const Status begun = database.begin(); !begun)

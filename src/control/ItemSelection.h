@@ -5,6 +5,7 @@
 #include <QString>
 #include <QStringList>
 #include <QVector>
+#include <memory>
 
 namespace zorbin {
 
@@ -22,12 +23,27 @@ struct SelectableItem
 // the marked ones, marked items first and then by key.
 QString BuildItemListSQL(bool onlyMarked);
 
-// The items of the list query, in its order. A failure's description is the engine's.
-Result<QVector<SelectableItem>> readSelectableItems(WorkDatabase &database, bool onlyMarked);
+// The items of a working database and their marks, open for the item selection dialog.
+// A failure's description is the engine's.
+class MarkedItems
+{
+public:
+    static Result<std::unique_ptr<MarkedItems>> open(const QString &workDbFile);
+    ~MarkedItems();
+    MarkedItems(const MarkedItems &) = delete;
+    MarkedItems &operator=(const MarkedItems &) = delete;
 
-// Writes the mark of each of `keys` into tItems.Include at once (in one transaction when there
-// are several). A key that no item has changes nothing.
-Status writeItemMarks(WorkDatabase &database, const QStringList &keys, bool include);
+    // The items of the list query, in its order.
+    Result<QVector<SelectableItem>> read(bool onlyMarked);
+    // Writes the mark of each of `keys` into tItems.Include at once (in one transaction when
+    // there are several). A key that no item has changes nothing.
+    Status write(const QStringList &keys, bool include);
+
+private:
+    explicit MarkedItems(std::unique_ptr<WorkDatabase> database);
+
+    std::unique_ptr<WorkDatabase> m_database;
+};
 
 // Which column of the list a search looks at.
 enum class ItemSearchColumn { Key, Name };

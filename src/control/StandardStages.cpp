@@ -1,6 +1,6 @@
 #include "control/StandardStages.h"
 
-#include "control/RunContext.h"
+#include "model/RunContext.h"
 #include "output/CatalogPages.h"
 #include "output/ImageCollection.h"
 #include "output/ListPage.h"

@@ -1,7 +1,5 @@
 #include "dialogs/ItemListModel.h"
 
-#include "workdb/WorkDatabase.h"
-
 #include <QHash>
 
 namespace zorbin {
@@ -16,7 +14,7 @@ Status ItemListModel::open(const QString &path)
     m_items.clear();
     m_database.reset();
     endResetModel();
-    auto opened = WorkDatabase::open(path);
+    auto opened = MarkedItems::open(path);
     if (!opened)
         return opened.status();
     m_database = std::move(opened).value();
@@ -27,7 +25,7 @@ Status ItemListModel::reload(bool onlyMarked)
 {
     if (!m_database)
         return Status::ok();
-    auto items = readSelectableItems(*m_database, onlyMarked);
+    auto items = m_database->read(onlyMarked);
     beginResetModel();
     m_items = items ? std::move(items).value() : QVector<SelectableItem>();
     endResetModel();
@@ -42,7 +40,7 @@ Status ItemListModel::setAllIncluded(bool include)
     keys.reserve(m_items.size());
     for (const SelectableItem &item : std::as_const(m_items))
         keys << item.key;
-    const Status written = writeItemMarks(*m_database, keys, include);
+    const Status written = m_database->write(keys, include);
     if (written) {
         for (SelectableItem &item : m_items)
             item.include = include;
@@ -51,7 +49,7 @@ Status ItemListModel::setAllIncluded(bool include)
         return written;
     }
     // Part of the rows may have been written: show what is stored.
-    auto stored = readSelectableItems(*m_database, false);
+    auto stored = m_database->read(false);
     if (stored) {
         QHash<QString, bool> marks;
         for (const SelectableItem &item : std::as_const(stored.value()))
@@ -132,7 +130,7 @@ bool ItemListModel::setData(const QModelIndex &index, const QVariant &value, int
         return false;
     SelectableItem &item = m_items[index.row()];
     const bool include = value.toInt() == Qt::Checked;
-    if (const Status written = writeItemMarks(*m_database, {item.key}, include); !written) {
+    if (const Status written = m_database->write({item.key}, include); !written) {
         Q_EMIT writeFailed(written.description());
         return false;
     }

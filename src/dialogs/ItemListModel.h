@@ -8,8 +8,6 @@
 
 namespace zorbin {
 
-class WorkDatabase;
-
 // The items of the working database as the item selection dialog lists them: key, name, and
 // the mark as a check box in the third column. A change of a mark is written to
 // tItems.Include at once. The rows are those of the list query at the last load; a mark changed
@@ -48,7 +46,7 @@ Q_SIGNALS:
     void writeFailed(const QString &description);
 
 private:
-    std::unique_ptr<WorkDatabase> m_database;
+    std::unique_ptr<MarkedItems> m_database;
     QVector<SelectableItem> m_items;
 };
 

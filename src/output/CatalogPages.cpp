@@ -1,7 +1,7 @@
 #include "output/CatalogPages.h"
 
-#include "control/ProgressMeter.h"
-#include "control/RunContext.h"
+#include "model/ProgressMeter.h"
+#include "model/RunContext.h"
 #include "output/CatalogRows.h"
 #include "output/FileNaming.h"
 #include "output/ImageDimensions.h"

@@ -1,7 +1,7 @@
 #include "output/CatalogQuery.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include <QStringList>
 #include <limits>

@@ -1,7 +1,7 @@
 #include "output/GridSize.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include <limits>
 

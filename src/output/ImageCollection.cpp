@@ -1,8 +1,8 @@
 #include "output/ImageCollection.h"
 
-#include "control/CatalogSettings.h"
-#include "control/ProgressMeter.h"
-#include "control/RunContext.h"
+#include "model/CatalogSettings.h"
+#include "model/ProgressMeter.h"
+#include "model/RunContext.h"
 #include "output/CatalogQuery.h"
 #include "output/FileNaming.h"
 #include "output/images/PictureCopier.h"

@@ -1,6 +1,6 @@
 #include "output/ItemCell.h"
 
-#include "control/CatalogField.h"
+#include "model/CatalogField.h"
 #include "output/CatalogRows.h"
 #include "output/FileNaming.h"
 #include "output/ImageDimensions.h"

@@ -1,7 +1,7 @@
 #include "output/PageLayout.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "output/CatalogQuery.h"
 #include "output/FileNaming.h"
 

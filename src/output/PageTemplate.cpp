@@ -1,6 +1,6 @@
 #include "output/PageTemplate.h"
 
-#include "control/OutputFolder.h"
+#include "output/OutputFolder.h"
 #include "output/FileNaming.h"
 #include "output/PageLayout.h"
 #include "platform/Windows1255Writer.h"

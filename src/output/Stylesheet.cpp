@@ -1,8 +1,8 @@
 #include "output/Stylesheet.h"
 
-#include "control/CatalogSettings.h"
-#include "control/OutputFolder.h"
-#include "control/RunContext.h"
+#include "model/CatalogSettings.h"
+#include "output/OutputFolder.h"
+#include "model/RunContext.h"
 #include "output/CatalogQuery.h"
 #include "output/GridSize.h"
 #include "platform/FileSystem.h"

@@ -1,7 +1,7 @@
 #include "source/ChoiceLists.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 

@@ -1,7 +1,7 @@
 #include "source/ConnectionStore.h"
 
 #include "common/Numbers.h"
-#include "control/SettingsPersistence.h"
+#include "model/SettingsPersistence.h"
 
 #include <limits>
 

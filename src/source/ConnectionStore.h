@@ -1,6 +1,6 @@
 #pragma once
 
-#include "source/ConnectionParams.h"
+#include "model/ConnectionParams.h"
 
 #include <QString>
 #include <optional>

@@ -1,6 +1,6 @@
 #include "source/LogonForm.h"
 
-#include "control/SettingsPersistence.h"
+#include "model/SettingsPersistence.h"
 #include "platform/SettingsStore.h"
 #include "source/ConnectionStore.h"
 #include "source/ConnectionString.h"

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "common/Status.h"
-#include "control/ChoiceList.h"
-#include "source/ConnectionParams.h"
+#include "model/ChoiceList.h"
+#include "model/ConnectionParams.h"
 
 #include <QString>
 #include <cstdint>

@@ -1,6 +1,6 @@
 #include "source/SourceCriteria.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include <QRegularExpression>
 

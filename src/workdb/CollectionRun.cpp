@@ -1,9 +1,9 @@
 #include "workdb/CollectionRun.h"
 
-#include "control/CatalogSettings.h"
-#include "control/RunContext.h"
-#include "control/RunState.h"
-#include "control/UserPort.h"
+#include "model/CatalogSettings.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
+#include "model/UserPort.h"
 #include "workdb/CollectionLock.h"
 #include "workdb/CollectionSteps.h"
 #include "workdb/WorkDatabase.h"

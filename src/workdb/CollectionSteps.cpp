@@ -1,7 +1,7 @@
 #include "workdb/CollectionSteps.h"
 
-#include "control/CatalogSettings.h"
-#include "control/RunContext.h"
+#include "model/CatalogSettings.h"
+#include "model/RunContext.h"
 #include "platform/Paths.h"
 #include "workdb/CopyLoop.h"
 #include "workdb/SourceStatements.h"

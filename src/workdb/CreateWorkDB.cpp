@@ -1,5 +1,5 @@
-#include "control/RunContext.h"
-#include "control/UserPort.h"
+#include "model/RunContext.h"
+#include "model/UserPort.h"
 #include "platform/FileSystem.h"
 #include "workdb/WorkDatabase.h"
 #include "workdb/WorkDatabasePath.h"

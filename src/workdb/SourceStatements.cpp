@@ -1,6 +1,6 @@
 #include "workdb/SourceStatements.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "source/SourceCriteria.h"
 
 namespace zorbin {

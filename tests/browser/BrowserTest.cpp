@@ -1,12 +1,12 @@
 // A real browser opens catalogs from disk: Debian's Chromium without a screen reads each page
 // through inspect-catalog.html and reports what it shows.
 #include "HeadlessChromium.h"
-#include "control/CatalogSettings.h"
-#include "control/RunContext.h"
-#include "control/RunState.h"
+#include "model/CatalogSettings.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
 #include "output/CatalogPages.h"
 #include "platform/FileSystem.h"
-#include "source/ConnectionParams.h"
+#include "model/ConnectionParams.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"

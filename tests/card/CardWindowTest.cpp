@@ -1,8 +1,8 @@
 #include "card/CardWindow.h"
 
 #include "card/MainCard.h"
-#include "control/ProgressMeter.h"
-#include "control/UserPort.h"
+#include "model/ProgressMeter.h"
+#include "model/UserPort.h"
 #include "testutil/MemorySettingsStore.h"
 #include "testutil/RecordingStages.h"
 #include "testutil/TestMain.h"

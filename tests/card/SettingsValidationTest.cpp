@@ -1,6 +1,6 @@
-#include "control/SettingsValidation.h"
+#include "model/SettingsValidation.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "testutil/TestMain.h"
 
 #include <QTest>

@@ -1,6 +1,6 @@
 #include "control/CatalogControl.h"
 
-#include "control/CopiedPictures.h"
+#include "output/CopiedPictures.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/MemorySettingsStore.h"
 #include "testutil/RecordingStages.h"

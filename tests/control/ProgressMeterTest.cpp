@@ -1,6 +1,6 @@
-#include "control/ProgressMeter.h"
+#include "model/ProgressMeter.h"
 
-#include "control/RunState.h"
+#include "model/RunState.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/TestMain.h"
 

@@ -1,6 +1,6 @@
-#include "control/SettingsPersistence.h"
+#include "model/SettingsPersistence.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "platform/Paths.h"
 #include "platform/SettingsStore.h"
 #include "testutil/MemorySettingsStore.h"

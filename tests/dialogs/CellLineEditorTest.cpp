@@ -1,7 +1,7 @@
-#include "dialogs/CellLineEditor.h"
+#include "card/CellLineEditor.h"
 
 #include "card/SettingsBinder.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "testutil/TestMain.h"
 
 #include <QApplication>

@@ -1,6 +1,6 @@
 #include "dialogs/SelectItemDialog.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "control/ItemSelection.h"
 #include "dialogs/ItemListModel.h"
 #include "output/CatalogQuery.h"

@@ -1,7 +1,7 @@
 // The catalog statement: which columns each cell line adds, the order, the filters.
 #include "output/CatalogQuery.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "testutil/TestMain.h"
 
 #include <QTest>

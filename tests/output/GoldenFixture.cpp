@@ -1,7 +1,7 @@
 #include "GoldenFixture.h"
 
-#include "control/CatalogSettings.h"
-#include "control/SettingsPersistence.h"
+#include "model/CatalogSettings.h"
+#include "model/SettingsPersistence.h"
 #include "platform/SettingsStore.h"
 #include "testutil/TestFiles.h"
 #include "testutil/WorkDatabaseFixture.h"

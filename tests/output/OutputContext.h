@@ -1,10 +1,10 @@
 #pragma once
 
-#include "control/CatalogSettings.h"
-#include "control/RunContext.h"
-#include "control/RunState.h"
+#include "model/CatalogSettings.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
 #include "platform/FileSystem.h"
-#include "source/ConnectionParams.h"
+#include "model/ConnectionParams.h"
 #include "testutil/RecordingUserPort.h"
 
 namespace zorbin::test {

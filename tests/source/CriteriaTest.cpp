@@ -1,4 +1,4 @@
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 #include "source/SourceCriteria.h"

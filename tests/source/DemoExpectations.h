@@ -1,7 +1,7 @@
 #pragma once
 
-#include "control/ChoiceList.h"
-#include "source/ConnectionParams.h"
+#include "model/ChoiceList.h"
+#include "model/ConnectionParams.h"
 
 #include <QList>
 #include <QPair>

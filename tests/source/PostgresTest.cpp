@@ -1,5 +1,5 @@
 #include "DemoExpectations.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "source/ChoiceLists.h"
 #include "source/ConnectionString.h"
 #include "source/LogonForm.h"

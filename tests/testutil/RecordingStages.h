@@ -1,7 +1,7 @@
 #pragma once
 
 #include "control/CatalogStages.h"
-#include "control/RunContext.h"
+#include "model/RunContext.h"
 
 #include <QStringList>
 #include <functional>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
-#include "source/ConnectionParams.h"
+#include "model/ConnectionParams.h"
 
 #include <QString>
 

@@ -1,6 +1,6 @@
 #include "workdb/SourceStatements.h"
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 #include "testutil/TestMain.h"
 
 #include <QTest>

@@ -4,7 +4,7 @@
 #include "card/SettingsBinder.h"
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
-#include "dialogs/CellLineEditor.h"
+#include "card/CellLineEditor.h"
 
 #include <QCheckBox>
 #include <QComboBox>

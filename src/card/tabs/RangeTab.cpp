@@ -4,7 +4,7 @@
 #include "card/SettingsBinder.h"
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
-#include "control/UserPort.h"
+#include "model/UserPort.h"
 #include "dialogs/SelectItemDialog.h"
 
 #include <QCheckBox>

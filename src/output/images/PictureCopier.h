@@ -1,7 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
-#include "control/CopiedPictures.h"
+#include "output/CopiedPictures.h"
 
 #include <QHash>
 #include <QString>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include <QString>
 #include <cstdint>

@@ -1,4 +1,4 @@
-#include "control/CellLine.h"
+#include "model/CellLine.h"
 
 #include "common/Numbers.h"
 

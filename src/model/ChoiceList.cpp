@@ -1,4 +1,4 @@
-#include "control/ChoiceList.h"
+#include "model/ChoiceList.h"
 
 namespace zorbin {
 

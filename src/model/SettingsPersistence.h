@@ -1,7 +1,7 @@
 #pragma once
 
-#include "control/CatalogSettings.h"
-#include "control/ControlProperty.h"
+#include "model/CatalogSettings.h"
+#include "model/ControlProperty.h"
 
 #include <QHash>
 #include <QString>

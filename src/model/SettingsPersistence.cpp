@@ -1,4 +1,4 @@
-#include "control/SettingsPersistence.h"
+#include "model/SettingsPersistence.h"
 
 #include "platform/Paths.h"
 #include "platform/SettingsStore.h"

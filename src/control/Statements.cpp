@@ -1,13 +1,13 @@
-#include "cli/Statements.h"
+#include "control/Statements.h"
 
-#include "control/CatalogSettings.h"
-#include "control/RunContext.h"
+#include "model/CatalogSettings.h"
+#include "model/RunContext.h"
 #include "output/CatalogQuery.h"
 #include "source/ConnectionString.h"
 #include "workdb/CollectionRun.h"
 #include "workdb/SourceStatements.h"
 
-namespace zorbin::cli {
+namespace zorbin {
 namespace {
 
 // The number of the entry chosen in a list whose step the settings enable; the collection's
@@ -68,4 +68,4 @@ Result<std::vector<std::pair<QString, QString>>> runStatements(RunContext &conte
     return statements;
 }
 
-} // namespace zorbin::cli
+} // namespace zorbin

@@ -7,14 +7,12 @@
 #include <vector>
 
 namespace zorbin {
-struct RunContext;
-}
 
-namespace zorbin::cli {
+struct RunContext;
 
 // Every statement a catalog run with these settings would send, labelled: "connection" (the
 // connection text, password masked), "items", "sort-groups", "price1", "price2", "note1",
 // "note2", "catalog"; only the steps the settings enable.
 Result<std::vector<std::pair<QString, QString>>> runStatements(RunContext &context);
 
-} // namespace zorbin::cli
+} // namespace zorbin

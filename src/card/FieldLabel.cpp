@@ -1,4 +1,4 @@
-#include "dialogs/FieldLabel.h"
+#include "card/FieldLabel.h"
 
 #include <QApplication>
 #include <QDrag>

@@ -1,4 +1,4 @@
-#include "control/CatalogField.h"
+#include "model/CatalogField.h"
 
 namespace zorbin {
 

@@ -1,7 +1,7 @@
-#include "control/SettingsValidation.h"
+#include "model/SettingsValidation.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include <array>
 

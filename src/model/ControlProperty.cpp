@@ -1,4 +1,4 @@
-#include "control/ControlProperty.h"
+#include "model/ControlProperty.h"
 
 #include "common/Numbers.h"
 

@@ -1,7 +1,7 @@
-#include "control/CellLineEditing.h"
+#include "model/CellLineEditing.h"
 
 #include "common/Numbers.h"
-#include "control/CatalogField.h"
+#include "model/CatalogField.h"
 
 namespace zorbin {
 namespace {

@@ -1,4 +1,4 @@
-#include "control/CatalogSettings.h"
+#include "model/CatalogSettings.h"
 
 #include "platform/Paths.h"
 

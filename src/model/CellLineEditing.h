@@ -1,6 +1,6 @@
 #pragma once
 
-#include "control/CellLine.h"
+#include "model/CellLine.h"
 
 #include <QString>
 

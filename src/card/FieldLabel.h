@@ -1,6 +1,6 @@
 #pragma once
 
-#include "control/CatalogField.h"
+#include "model/CatalogField.h"
 
 #include <QLabel>
 #include <optional>

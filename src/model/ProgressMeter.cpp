@@ -1,8 +1,8 @@
-#include "control/ProgressMeter.h"
+#include "model/ProgressMeter.h"
 
 #include "common/Numbers.h"
-#include "control/RunState.h"
-#include "control/UserPort.h"
+#include "model/RunState.h"
+#include "model/UserPort.h"
 
 #include <algorithm>
 

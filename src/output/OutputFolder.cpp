@@ -1,7 +1,7 @@
-#include "control/OutputFolder.h"
+#include "output/OutputFolder.h"
 
-#include "control/CatalogSettings.h"
-#include "control/CopiedPictures.h"
+#include "model/CatalogSettings.h"
+#include "output/CopiedPictures.h"
 #include "platform/FileSystem.h"
 #include "platform/Paths.h"
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "control/CellLine.h"
-#include "control/ChoiceList.h"
+#include "model/CellLine.h"
+#include "model/ChoiceList.h"
 
 #include <QString>
 #include <array>

@@ -1,4 +1,4 @@
-#include "control/CopiedPictures.h"
+#include "output/CopiedPictures.h"
 
 #include "platform/FileSystem.h"
 #include "platform/Paths.h"

@@ -1,7 +1,7 @@
-#include "dialogs/CellLineEditor.h"
+#include "card/CellLineEditor.h"
 
 #include "card/SettingsBinder.h"
-#include "control/CellLineEditing.h"
+#include "model/CellLineEditing.h"
 
 #include <QCheckBox>
 #include <QComboBox>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "control/CellLine.h"
-#include "dialogs/FieldLabel.h"
+#include "model/CellLine.h"
+#include "card/FieldLabel.h"
 
 #include <QGroupBox>
 #include <array>
