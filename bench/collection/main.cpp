@@ -57,16 +57,16 @@ void chooseData(ChoiceList &list, int itemData)
 // Picture from the file field, standard name, both price lists and both note kinds.
 void chooseEverything(CatalogSettings &settings)
 {
-    settings.OptPicSource.setValue(PictureFromFileField, true);
-    settings.CmbItemNameType.setCurrentIndex(0);
-    settings.chkUsePriceField = CheckValue::Checked;
-    chooseData(settings.cmbPriceField, 1);
-    settings.ChkUsePriceField2 = CheckValue::Checked;
-    chooseData(settings.cmbPriceField2, 2);
-    settings.ChkUseExtraNote1 = CheckValue::Checked;
-    chooseData(settings.cmbExtraNote1, 1);
-    settings.ChkUseExtraNote2 = CheckValue::Checked;
-    chooseData(settings.cmbExtraNote2, 2);
+    settings.pictureSource = PictureSource::FileField;
+    settings.itemName = ItemNameSource::Standard;
+    settings.collectPrice1 = true;
+    chooseData(settings.priceList1, 1);
+    settings.collectPrice2 = true;
+    chooseData(settings.priceList2, 2);
+    settings.collectNote1 = true;
+    chooseData(settings.extraNote1, 1);
+    settings.collectNote2 = true;
+    chooseData(settings.extraNote2, 2);
 }
 
 QStringList statementsOf(const CatalogSettings &settings)
@@ -121,10 +121,11 @@ Totals runCollection(const char *label, CatalogSettings &settings, ConnectionPar
     RunContext context{settings, connection, state, clock, localFileSystem()};
     const CpuClock cpu;
     clock.start();
-    const Status collected = BuildAndCollectData(context);
+    const Result<CollectionReport> collected = BuildAndCollectData(context);
     clock.finish();
-    if (!collected || state.CollectFailed || clock.messageCount() > 0) {
-        std::fprintf(stderr, "The collection (%s) failed: %s\n", label, qPrintable(collected.description()));
+    const Status failure = collected ? collected->stepFailure : collected.status();
+    if (!failure || clock.messageCount() > 0) {
+        std::fprintf(stderr, "The collection (%s) failed: %s\n", label, qPrintable(failure.description()));
         return {};
     }
     std::printf("\nCollection, %s\n  %-28s %9s %9s %11s\n", label, "step", "rows", "seconds", "rows/s");

@@ -68,31 +68,31 @@ Status makeWorkDatabase(const QString &path, int items, const QStringList &pictu
 
 void useBenchSettings(CatalogSettings &settings, const QString &outputFolder, const QString &logo)
 {
-    settings.txtPagingPath = outputFolder;
-    settings.txtRows = QStringLiteral("8");
-    settings.txtCols = QStringLiteral("3");
-    settings.txtImageW = QStringLiteral("120");
-    settings.txtImageH = QStringLiteral("90");
-    settings.txtTopPercent = QStringLiteral("10");
-    settings.txtBottomPercent = QStringLiteral("8");
-    settings.txtTopTitle = QStringLiteral("קטלוג מוצרים");
-    settings.txtTopTitle2 = QStringLiteral("מהדורת בדיקה");
-    settings.txtBottomTitle = QStringLiteral("כל הזכויות שמורות");
-    settings.txtLogo = logo;
+    settings.outputFolder = outputFolder;
+    settings.rows = 8;
+    settings.columns = 3;
+    settings.pictureWidth = 120;
+    settings.pictureHeight = 90;
+    settings.topPercent = 10;
+    settings.bottomPercent = 8;
+    settings.topTitle = QStringLiteral("קטלוג מוצרים");
+    settings.topTitle2 = QStringLiteral("מהדורת בדיקה");
+    settings.bottomTitle = QStringLiteral("כל הזכויות שמורות");
+    settings.logo = logo;
     const QStringList tags{QStringLiteral("0"), QStringLiteral("1"), QStringLiteral("2"), QStringLiteral("4"),
                            QStringLiteral("6")};
     const QStringList captions{QString(), QStringLiteral("מק\"ט"), QString(), QStringLiteral("מחיר"),
                                QStringLiteral("יחידה")};
     for (qsizetype i = 0; i < tags.size(); ++i) {
-        settings.lines[static_cast<std::size_t>(i)].tag = tags.at(i);
+        settings.lines[static_cast<std::size_t>(i)].field = fieldOfTag(tags.at(i));
         settings.lines[static_cast<std::size_t>(i)].caption = captions.at(i);
     }
-    settings.cmbPriceField.clear();
-    settings.cmbPriceField.addEntry(QStringLiteral("מחיר מכירה"), 0);
-    settings.cmbPriceField.setCurrentIndex(0);
-    settings.CmbSortBy.setCurrentIndex(0);
-    settings.CmbSortDir.setCurrentIndex(0);
-    settings.cmbPicLocation.setCurrentIndex(0);
+    settings.priceList1.clear();
+    settings.priceList1.addEntry(QStringLiteral("מחיר מכירה"), 0);
+    settings.priceList1.setCurrentIndex(0);
+    settings.sortKey = SortKey::ItemKey;
+    settings.sortDirection = SortDirection::Ascending;
+    settings.pictureLocation = PictureLocation::AsLine;
 }
 
 } // namespace zorbin::bench

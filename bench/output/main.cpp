@@ -8,14 +8,14 @@
 #include "CountingFileSystem.h"
 #include "MemoryUse.h"
 #include "model/CatalogSettings.h"
-#include "output/OutputFolder.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "model/UserPort.h"
 #include "output/CatalogPages.h"
 #include "output/ImageCollection.h"
+#include "output/OutputFolder.h"
 #include "output/Stylesheet.h"
-#include "model/ConnectionParams.h"
 
 #include <QCommandLineParser>
 #include <QCoreApplication>
@@ -150,7 +150,7 @@ int main(int argc, char *argv[])
         if (modes != QLatin1String("both") &&
             modes != QLatin1String(mode == 0 ? "one-file" : "file-per-page"))
             continue;
-        settings.cmbPageSplit.setCurrentIndex(mode);
+        settings.pageSplit = static_cast<PageSplit>(mode);
         fail(cleanCatalogOutput(files, output));
         files.clear();
         resetPeakMemory();

@@ -1,7 +1,8 @@
 // zorbin: the desktop program, a window that hosts the catalog control.
 #include "card/CardWindow.h"
-#include "platform/SettingsStore.h"
+#include "card/WidgetUserPort.h"
 #include "control/Program.h"
+#include "platform/SettingsStore.h"
 
 #include <QApplication>
 #include <QIcon>
@@ -18,8 +19,11 @@ int main(int argc, char *argv[])
     QApplication::setWindowIcon(
         QIcon::fromTheme(QStringLiteral("zorbin"), QIcon(QStringLiteral(":/zorbin.png"))));
 
+    // The window goes before the control it shows, and the control before its port and store.
     const auto store = zorbin::openUserSettingsStore();
-    zorbin::CardWindow window(*store);
+    zorbin::WidgetUserPort user;
+    const auto control = zorbin::assembleControl(user, *store);
+    zorbin::CardWindow window(*control, user);
     window.resize(window.sizeHint().expandedTo(QSize(860, 640)));
     window.show();
     return QApplication::exec();

@@ -7,8 +7,8 @@
 
 namespace zorbin {
 
-CardWindow::CardWindow(SettingsStore &store, CatalogControl::StagesFactory stages, QWidget *parent)
-    : QMainWindow(parent), m_card(new MainCard(store, std::move(stages), this))
+CardWindow::CardWindow(CatalogControl &control, WidgetUserPort &user, QWidget *parent)
+    : QMainWindow(parent), m_card(new MainCard(control, user, this))
 {
     setObjectName(QStringLiteral("CardWindow"));
     setWindowTitle(QStringLiteral("זורבין - קטלוג מוצרים"));
@@ -30,7 +30,7 @@ void CardWindow::closeEvent(QCloseEvent *event)
     event->ignore();
     if (!m_closeAfterRun) {
         m_closeAfterRun = true;
-        m_card->control().cmdStop_Click();
+        m_card->control().requestStop();
     }
 }
 

@@ -7,7 +7,7 @@
 namespace zorbin {
 
 class MainCard;
-class SettingsStore;
+class WidgetUserPort;
 
 // The desktop program's main window: it hosts the settings control.
 //
@@ -19,9 +19,8 @@ class CardWindow : public QMainWindow
     Q_OBJECT
 
 public:
-    // `store` must outlive the window. Without a factory the standard stages are used.
-    explicit CardWindow(SettingsStore &store, CatalogControl::StagesFactory stages = {},
-                        QWidget *parent = nullptr);
+    // `control` and `user` (the port the control was made with) must outlive the window.
+    CardWindow(CatalogControl &control, WidgetUserPort &user, QWidget *parent = nullptr);
 
     MainCard *card() const { return m_card; }
 

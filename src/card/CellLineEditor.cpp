@@ -1,7 +1,7 @@
 #include "card/CellLineEditor.h"
 
+#include "card/CellLineEditing.h"
 #include "card/SettingsBinder.h"
-#include "model/CellLineEditing.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -81,7 +81,7 @@ CellLineEditor::CellLineEditor(CellLines &lines, SettingsBinder &binder, QWidget
     auto *columns = new QWidget(this);
     buildColumns(columns);
     for (int i = 0; i < CellLineCount; ++i)
-        binder.text(m_captions[static_cast<std::size_t>(i)], m_lines[static_cast<std::size_t>(i)].caption);
+        binder.text(m_captions[static_cast<std::size_t>(i)], QStringLiteral("LineCaption%1").arg(i));
     binder.custom([this] {
         for (int i = 0; i < CellLineCount; ++i)
             showLine(i);

@@ -1,5 +1,6 @@
 #include "card/MainCard.h"
 
+#include "card/CellLineEditor.h"
 #include "card/FileChooser.h"
 #include "card/ProgressStrip.h"
 #include "card/SettingsBinder.h"
@@ -10,8 +11,6 @@
 #include "card/tabs/PageSetupTab.h"
 #include "card/tabs/RangeTab.h"
 #include "card/tabs/TitlesTab.h"
-#include "card/CellLineEditor.h"
-#include "platform/FileSystem.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
@@ -21,8 +20,8 @@
 
 namespace zorbin {
 
-MainCard::MainCard(SettingsStore &store, CatalogControl::StagesFactory stages, QWidget *parent)
-    : QWidget(parent)
+MainCard::MainCard(CatalogControl &control, WidgetUserPort &user, QWidget *parent)
+    : QWidget(parent), m_control(control), m_user(user)
 {
     setObjectName(QStringLiteral("MainCard"));
     setLayoutDirection(Qt::RightToLeft);
@@ -31,11 +30,9 @@ MainCard::MainCard(SettingsStore &store, CatalogControl::StagesFactory stages, Q
     m_Message1->setObjectName(QStringLiteral("Message1"));
     m_Message1->setAccessibleName(QStringLiteral("שורת מצב"));
     m_progress = new ProgressStrip(this);
-    m_user =
-        std::make_unique<WidgetUserPort>(this, m_Message1, m_progress, [this](bool busy) { setBusy(busy); });
-    m_control = std::make_unique<CatalogControl>(*m_user, store, localFileSystem(), std::move(stages));
-    m_binder = std::make_unique<SettingsBinder>();
-    m_context = std::make_unique<CardContext>(CardContext{*m_control, *m_binder, &systemFileChooser()});
+    m_user.attach(this, m_Message1, m_progress, [this](bool busy) { setBusy(busy); });
+    m_binder = std::make_unique<SettingsBinder>(m_control.settings());
+    m_context = std::make_unique<CardContext>(CardContext{m_control, *m_binder, &systemFileChooser()});
 
     buildTabs();
     auto *layout = new QVBoxLayout(this);
@@ -44,17 +41,14 @@ MainCard::MainCard(SettingsStore &store, CatalogControl::StagesFactory stages, Q
     layout->addWidget(m_Message1);
     layout->addWidget(m_progress);
 
-    m_control->UserControl_Initialize();
+    m_control.startUp();
     m_binder->refresh();
     m_tabs->setCurrentIndex(RangePage);
 }
 
 MainCard::~MainCard()
 {
-    // The widgets are bound to the control's settings record: they go first.
-    const auto children = findChildren<QWidget *>(QString(), Qt::FindDirectChildrenOnly);
-    for (QWidget *child : children)
-        delete child;
+    m_user.detach();
 }
 
 void MainCard::buildTabs()
@@ -92,10 +86,10 @@ QLayout *MainCard::buildCommands()
     m_cmdRunMailing->setDefault(true);
     m_cmdStop->setEnabled(false);
 
-    connect(m_cmdRunMailing, &QPushButton::clicked, this, [this] { m_control->cmdRunMailing_Click(); });
-    connect(m_CmdPreview, &QPushButton::clicked, this, [this] { m_control->CmdPreview_Click(); });
-    connect(m_cmdStop, &QPushButton::clicked, this, [this] { m_control->cmdStop_Click(); });
-    connect(m_CmdDef, &QPushButton::clicked, this, [this] { m_control->CmdDef_Click(); });
+    connect(m_cmdRunMailing, &QPushButton::clicked, this, &MainCard::cmdRunMailing_Click);
+    connect(m_CmdPreview, &QPushButton::clicked, this, &MainCard::CmdPreview_Click);
+    connect(m_cmdStop, &QPushButton::clicked, this, &MainCard::cmdStop_Click);
+    connect(m_CmdDef, &QPushButton::clicked, this, &MainCard::CmdDef_Click);
 
     auto *buttons = new QHBoxLayout;
     buttons->addWidget(m_cmdRunMailing);
@@ -104,6 +98,26 @@ QLayout *MainCard::buildCommands()
     buttons->addStretch();
     buttons->addWidget(m_CmdDef);
     return buttons;
+}
+
+void MainCard::cmdRunMailing_Click()
+{
+    m_control.askAndMakeCatalog();
+}
+
+void MainCard::CmdPreview_Click()
+{
+    m_control.askAndMakeList();
+}
+
+void MainCard::cmdStop_Click()
+{
+    m_control.requestStop();
+}
+
+void MainCard::CmdDef_Click()
+{
+    m_control.saveSettings();
 }
 
 void MainCard::setFileChooser(FileChooser &chooser)

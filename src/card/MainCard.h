@@ -21,23 +21,23 @@ class TitlesTab;
 class GeneralTab;
 class WidgetUserPort;
 
-// The settings control: six tabs bound to the control's settings record, the command buttons,
-// the status line and the progress bar. It forwards the buttons to its CatalogControl.
+// The settings control: six tabs bound to the control's options, the command buttons, the
+// status line and the progress bar. Its buttons are the control's commands.
 //
-// Created, it loads the connection, the lists from the accounting database and the stored
-// settings, shows them, and opens on the item-range tab. While a run is in progress the run
-// buttons, the save button and the settings are disabled and only the stop button works.
+// Created, it attaches its status line and progress bar to `user`, has the control start up
+// (the connection, the lists from the accounting database, the stored options), shows the
+// options, and opens on the item-range tab. While a run is in progress the run buttons, the save
+// button and the settings are disabled and only the stop button works.
 class MainCard : public QWidget
 {
     Q_OBJECT
 
 public:
-    // `store` must outlive the card. Without a factory the standard stages are used.
-    explicit MainCard(SettingsStore &store, CatalogControl::StagesFactory stages = {},
-                      QWidget *parent = nullptr);
+    // `control` and `user` (the port the control was made with) must outlive the card.
+    MainCard(CatalogControl &control, WidgetUserPort &user, QWidget *parent = nullptr);
     ~MainCard() override;
 
-    CatalogControl &control() { return *m_control; }
+    CatalogControl &control() { return m_control; }
     QTabWidget *tabs() const { return m_tabs; }
     PageSetupTab *pageSetupTab() const { return m_pageSetupTab; }
     TitlesTab *titlesTab() const { return m_titlesTab; }
@@ -48,7 +48,7 @@ public:
     void setFileChooser(FileChooser &chooser);
     // The widgets show the settings record again (after the core changed it).
     void showSettings();
-    bool isRunning() const { return m_control->isRunning(); }
+    bool isRunning() const { return m_control.isRunning(); }
 
     // Index of each tab of `SSTab1`.
     enum TabIndex {
@@ -63,6 +63,12 @@ public:
 Q_SIGNALS:
     // A run started (true) or ended (false).
     void busyChanged(bool busy);
+
+private Q_SLOTS:
+    void cmdRunMailing_Click();
+    void CmdPreview_Click();
+    void cmdStop_Click();
+    void CmdDef_Click();
 
 private:
     void buildTabs();
@@ -80,8 +86,8 @@ private:
     QPushButton *m_CmdDef = nullptr;
     QLabel *m_Message1 = nullptr;
     ProgressStrip *m_progress = nullptr;
-    std::unique_ptr<WidgetUserPort> m_user;
-    std::unique_ptr<CatalogControl> m_control;
+    CatalogControl &m_control;
+    WidgetUserPort &m_user;
     std::unique_ptr<SettingsBinder> m_binder;
     std::unique_ptr<CardContext> m_context;
 };

@@ -1,6 +1,8 @@
 #include "card/SettingsBinder.h"
 
 #include "card/tabs/TabBuilding.h"
+#include "model/CatalogSettings.h"
+#include "model/OptionTable.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
@@ -13,31 +15,8 @@
 namespace zorbin {
 namespace {
 
-Qt::CheckState checkStateOf(CheckValue value)
-{
-    switch (value) {
-    case CheckValue::Checked:
-        return Qt::Checked;
-    case CheckValue::Grayed:
-        return Qt::PartiallyChecked;
-    case CheckValue::Unchecked:
-        break;
-    }
-    return Qt::Unchecked;
-}
-
-CheckValue checkValueOf(int state)
-{
-    switch (static_cast<Qt::CheckState>(state)) {
-    case Qt::Checked:
-        return CheckValue::Checked;
-    case Qt::PartiallyChecked:
-        return CheckValue::Grayed;
-    case Qt::Unchecked:
-        break;
-    }
-    return CheckValue::Unchecked;
-}
+const QString Ticked = QStringLiteral("1");
+const QString NotTicked = QStringLiteral("0");
 
 void markProblem(QLineEdit *box, const std::optional<QString> &problem)
 {
@@ -51,7 +30,16 @@ void markProblem(QLineEdit *box, const std::optional<QString> &problem)
 
 } // namespace
 
-SettingsBinder::SettingsBinder(QObject *parent) : QObject(parent) {}
+SettingsBinder::SettingsBinder(CatalogSettings &settings, QObject *parent)
+    : QObject(parent), m_settings(settings)
+{}
+
+const StoredOption &SettingsBinder::option(const QString &key) const
+{
+    const StoredOption *found = findStoredOption(key);
+    Q_ASSERT_X(found, "SettingsBinder", "a widget bound to a key that is not stored");
+    return *found;
+}
 
 void SettingsBinder::showing(const std::function<void()> &change)
 {
@@ -61,46 +49,100 @@ void SettingsBinder::showing(const std::function<void()> &change)
     m_showing = wasShowing;
 }
 
-void SettingsBinder::text(QLineEdit *box, QString &value, int maxLength)
+void SettingsBinder::textBox(QLineEdit *box, std::function<QString()> read,
+                             std::function<void(const QString &)> write, int maxLength)
 {
     // A stored text longer than the limit (written by hand, or by an older version) is shown
     // whole rather than cut: the run uses what the user sees, and a save keeps it.
-    auto show = [box, &value, maxLength] {
+    auto show = [box, read, maxLength] {
+        const QString value = read();
         if (maxLength > 0)
             box->setMaxLength(std::max(maxLength, static_cast<int>(value.size())));
         if (box->text() != value)
             box->setText(value);
     };
     show();
-    connect(box, &QLineEdit::textChanged, this, [this, &value](const QString &typed) {
+    connect(box, &QLineEdit::textChanged, this, [this, write](const QString &typed) {
         if (!m_showing)
-            value = typed;
+            write(typed);
     });
     m_refreshers.push_back([this, show] { showing(show); });
 }
 
-void SettingsBinder::number(QLineEdit *box, QString &value, int maxLength, NumericSetting setting)
+void SettingsBinder::text(QLineEdit *box, const QString &key, int maxLength)
 {
-    text(box, value, maxLength);
+    const StoredOption &stored = option(key);
+    textBox(
+        box, [this, &stored] { return stored.storeText(m_settings); },
+        [this, &stored](const QString &typed) { stored.apply(m_settings, typed); }, maxLength);
+}
+
+void SettingsBinder::text(QLineEdit *box, QString &value, int maxLength)
+{
+    textBox(
+        box, [&value] { return value; }, [&value](const QString &typed) { value = typed; }, maxLength);
+}
+
+void SettingsBinder::number(QLineEdit *box, const QString &key, int maxLength,
+                            std::function<std::optional<QString>(const std::optional<int> &)> problem)
+{
+    text(box, key, maxLength);
     tabs::fitToCharacters(box, maxLength, QLatin1Char('0'));
     box->setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("\\d*")), box));
     box->setInputMethodHints(Qt::ImhDigitsOnly);
-    auto check = [box, setting] { markProblem(box, numericSettingProblem(setting, box->text())); };
+    if (!problem)
+        return;
+    auto check = [box, problem] {
+        markProblem(box, problem(numberFromText(box->text(), std::numeric_limits<std::int16_t>::min(),
+                                                std::numeric_limits<std::int16_t>::max())));
+    };
     connect(box, &QLineEdit::textChanged, box, check);
     check();
 }
 
-void SettingsBinder::check(QCheckBox *box, CheckValue &value)
+void SettingsBinder::check(QCheckBox *box, const QString &key)
 {
-    box->setCheckState(checkStateOf(value));
-    connect(box, &QCheckBox::stateChanged, this, [this, &value](int state) {
+    const StoredOption &stored = option(key);
+    auto ticked = [this, &stored] { return stored.storeText(m_settings) == Ticked; };
+    box->setChecked(ticked());
+    connect(box, &QCheckBox::toggled, this, [this, &stored](bool on) {
         if (!m_showing)
-            value = checkValueOf(state);
+            stored.apply(m_settings, on ? Ticked : NotTicked);
+    });
+    m_refreshers.push_back([this, box, ticked] {
+        if (box->isChecked() != ticked())
+            showing([&] { box->setChecked(ticked()); });
+    });
+}
+
+void SettingsBinder::check(QCheckBox *box, bool &value)
+{
+    box->setChecked(value);
+    connect(box, &QCheckBox::toggled, this, [this, &value](bool on) {
+        if (!m_showing)
+            value = on;
     });
     m_refreshers.push_back([this, box, &value] {
-        if (box->checkState() != checkStateOf(value))
-            showing([&] { box->setCheckState(checkStateOf(value)); });
+        if (box->isChecked() != value)
+            showing([&] { box->setChecked(value); });
     });
+}
+
+void SettingsBinder::choice(QComboBox *box, const QString &key, const QStringList &entries)
+{
+    const StoredOption &stored = option(key);
+    box->addItems(entries);
+    auto show = [this, box, &stored] {
+        const int index = stored.storeText(m_settings).toInt();
+        if (box->currentIndex() != index)
+            showing([&] { box->setCurrentIndex(index); });
+    };
+    show();
+    connect(box, &QComboBox::currentIndexChanged, this, [this, &stored](int index) {
+        if (!m_showing)
+            stored.apply(m_settings, QString::number(index));
+    });
+    m_refreshers.push_back(show);
 }
 
 void SettingsBinder::choice(QComboBox *box, ChoiceList &list)
@@ -133,25 +175,26 @@ void SettingsBinder::choice(QComboBox *box, ChoiceList &list)
     m_refreshers.push_back(follow);
 }
 
-void SettingsBinder::options(const std::vector<QRadioButton *> &buttons, OptionGroup<3> &group)
+void SettingsBinder::options(const std::vector<QRadioButton *> &buttons, const QStringList &keys)
 {
-    Q_ASSERT(static_cast<int>(buttons.size()) == OptionGroup<3>::size());
+    Q_ASSERT(buttons.size() == static_cast<std::size_t>(keys.size()));
     auto *exclusive = new QButtonGroup(this);
-    for (int i = 0; i < static_cast<int>(buttons.size()); ++i) {
-        QRadioButton *button = buttons[static_cast<std::size_t>(i)];
-        exclusive->addButton(button, i);
-        connect(button, &QRadioButton::toggled, this, [this, &group, i](bool on) {
+    std::vector<const StoredOption *> stored;
+    for (std::size_t i = 0; i < buttons.size(); ++i) {
+        stored.push_back(&option(keys.at(static_cast<qsizetype>(i))));
+        exclusive->addButton(buttons[i], static_cast<int>(i));
+        connect(buttons[i], &QRadioButton::toggled, this, [this, option = stored.back()](bool on) {
             if (!m_showing && on)
-                group.setValue(i, true);
+                option->apply(m_settings, optionStoreText(true));
         });
     }
-    auto show = [this, exclusive, buttons, &group] {
+    auto show = [this, exclusive, buttons, stored] {
         showing([&] {
             // An exclusive group cannot show "none set", which a stored "False" for every
             // option gives.
             exclusive->setExclusive(false);
-            for (int i = 0; i < static_cast<int>(buttons.size()); ++i)
-                buttons[static_cast<std::size_t>(i)]->setChecked(group.value(i));
+            for (std::size_t i = 0; i < buttons.size(); ++i)
+                buttons[i]->setChecked(optionFromStoreText(stored[i]->storeText(m_settings)).value_or(false));
             exclusive->setExclusive(true);
         });
     };

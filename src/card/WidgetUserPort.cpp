@@ -30,10 +30,19 @@ QMessageBox::Icon boxIcon(MessageIcon icon)
 
 } // namespace
 
-WidgetUserPort::WidgetUserPort(QWidget *owner, QLabel *statusLine, ProgressStrip *progress,
-                               std::function<void(bool)> onBusy)
-    : m_owner(owner), m_statusLine(statusLine), m_progress(progress), m_onBusy(std::move(onBusy))
-{}
+void WidgetUserPort::attach(QWidget *owner, QLabel *statusLine, ProgressStrip *progress,
+                            std::function<void(bool)> onBusy)
+{
+    m_owner = owner;
+    m_statusLine = statusLine;
+    m_progress = progress;
+    m_onBusy = std::move(onBusy);
+}
+
+void WidgetUserPort::detach()
+{
+    attach(nullptr, nullptr, nullptr, {});
+}
 
 Answer WidgetUserPort::ask(const QString &text, const QString &title, QuestionButtons buttons)
 {
@@ -61,22 +70,24 @@ void WidgetUserPort::tell(const QString &text, const QString &title, MessageIcon
 
 void WidgetUserPort::showStatus(const QString &text)
 {
-    m_statusLine->setText(text);
+    if (m_statusLine)
+        m_statusLine->setText(text);
 }
 
 int WidgetUserPort::progressFrameWidth() const
 {
-    return m_progress->frameWidth();
+    return m_progress ? m_progress->frameWidth() : 0;
 }
 
 int WidgetUserPort::progressFillWidth() const
 {
-    return m_progress->fillWidth();
+    return m_progress ? m_progress->fillWidth() : 0;
 }
 
 void WidgetUserPort::setProgressFillWidth(int width)
 {
-    m_progress->setFillWidth(width);
+    if (m_progress)
+        m_progress->setFillWidth(width);
 }
 
 void WidgetUserPort::yield()

@@ -2,11 +2,9 @@
 
 #include "cli/CliUserPort.h"
 #include "cli/DemoFiles.h"
-#include "control/Statements.h"
-#include "control/CatalogControl.h"
 #include "control/Program.h"
+#include "control/Statements.h"
 #include "platform/Browser.h"
-#include "platform/FileSystem.h"
 #include "platform/SettingsStore.h"
 
 #include <QCommandLineParser>
@@ -17,7 +15,6 @@
 
 namespace zorbin::cli {
 namespace {
-
 
 QTextStream &out()
 {
@@ -92,22 +89,23 @@ std::optional<int> checkSettingsFile(const QCommandLineParser &parser)
     return std::nullopt;
 }
 
-int finish(const RunOutcome &outcome, const RunState &state)
+// The exit status of a run's outcome. What was written is printed whichever way the run ended:
+// a catalog written from the rows collected before a failed step does not hold everything the
+// settings asked for, and the exit status says so.
+int finish(const RunOutcome &outcome)
 {
-    // A collection step that failed has told its fault; whatever was written from the rows
-    // collected before it does not hold everything the settings asked for.
-    const int collected = state.CollectFailed ? Failure : Success;
-    switch (outcome.ending) {
-    case RunOutcome::Ending::Shown:
+    if (!outcome.file.isEmpty()) {
         out() << QDir::toNativeSeparators(outcome.file) << '\n';
         out().flush();
-        return collected;
+    }
+    switch (outcome.ending) {
+    case RunOutcome::Ending::Complete:
+        return Success;
     case RunOutcome::Ending::NoItems:
-        return state.CollectFailed ? Failure : EmptyCatalog;
+        return EmptyCatalog;
+    case RunOutcome::Ending::Partial:
+    case RunOutcome::Ending::Stopped:
     case RunOutcome::Ending::Failed:
-        if (!outcome.file.isEmpty())
-            out() << QDir::toNativeSeparators(outcome.file) << '\n';
-        return Failure;
     case RunOutcome::Ending::Declined:
         break;
     }
@@ -138,20 +136,16 @@ int runOutput(SettingsStore &store, const RunRequest &request)
 {
     std::unique_ptr<Browser> browser = request.open ? makeSystemBrowser() : nullptr;
     CliUserPort user(browser.get());
-    CatalogControl control(user, store, localFileSystem());
-    control.UserControl_Initialize();
-    CatalogSettings &settings = control.settings();
-    if (request.useMarked) {
-        settings.ChkSelectAccount = CheckValue::Checked;
-        control.runState().WorkDBFile = lastWorkDatabase();
-    }
+    const auto control = assembleControl(user, store);
+    control->startUp();
+    CatalogSettings &settings = control->settings();
+    if (request.useMarked)
+        control->useLastCollection();
     if (request.onlyWithPicture)
-        settings.ChkOnlyWithPic = CheckValue::Checked;
+        settings.onlyWithPicture = true;
     if (!request.outputFolder.isEmpty())
-        settings.txtPagingPath = request.outputFolder;
-    const RunOutcome outcome =
-        request.catalog ? control.produceCatalog() : control.produceList(!request.useMarked);
-    return finish(outcome, control.runState());
+        settings.outputFolder = request.outputFolder;
+    return finish(request.catalog ? control->makeCatalog() : control->makeList(!request.useMarked));
 }
 
 int catalogOrList(bool catalog, const QStringList &arguments)
@@ -209,9 +203,9 @@ int sql(const QStringList &arguments)
         return *exit;
     auto store = openStore(parser);
     CliUserPort user(nullptr);
-    CatalogControl control(user, *store, localFileSystem());
-    control.UserControl_Initialize();
-    const auto statements = runStatements(control.context());
+    const auto control = assembleControl(user, *store);
+    control->startUp();
+    const auto statements = runStatements(control->context());
     if (!statements) {
         err() << statements.status().description() << '\n';
         return Failure;

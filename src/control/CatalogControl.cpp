@@ -1,10 +1,12 @@
 #include "control/CatalogControl.h"
 
-#include "output/OutputFolder.h"
-#include "model/SettingsValidation.h"
-#include "control/StandardStages.h"
+#include "model/GridSize.h"
 #include "model/UserPort.h"
+#include "output/OutputFolder.h"
 #include "platform/FileSystem.h"
+#include "workdb/WorkDatabasePath.h"
+
+#include <QFileInfo>
 
 namespace zorbin {
 namespace {
@@ -13,6 +15,8 @@ const QString CatalogQuestion = QStringLiteral("להתחיל בהכנת הקטל
 const QString CatalogQuestionTitle = QStringLiteral("שאלה חשובה");
 const QString RescanQuestion = QStringLiteral("לסרוק מחדש את הפריטים?");
 const QString RescanQuestionTitle = QStringLiteral("שים לב");
+const QString MarkingRescanQuestion = QStringLiteral("לסרוק מחדש את רשימת הפריטים?");
+const QString MarkingRescanTitle = QStringLiteral("שימו לב");
 const QString NoItemsText = QStringLiteral(
     "אין בקטלוג פריטים: אף פריט אינו עונה על ההגדרות שנבחרו. יש לבדוק את טווח הפריטים ואת הפריטים המסומנים.");
 const QString NoItemsTitle = QStringLiteral("הקטלוג ריק");
@@ -42,54 +46,60 @@ private:
     CatalogControl &m_control;
 };
 
-CatalogControl::CatalogControl(UserPort &user, SettingsStore &store, FileSystem &files, StagesFactory stages)
+CatalogControl::CatalogControl(UserPort &user, SettingsStore &store, FileSystem &files,
+                               std::unique_ptr<CatalogStages> stages)
     : m_user(user), m_store(store),
       m_files(files), m_context{m_settings, m_connection, m_state, m_user, m_files},
-      m_persistence(store, m_settings)
-{
-    m_stages = stages ? stages(m_context, m_store) : makeStandardStages(m_context, m_store);
-}
+      m_persistence(store, m_settings), m_stages(std::move(stages))
+{}
 
 CatalogControl::~CatalogControl() = default;
 
-void CatalogControl::UserControl_Initialize()
+void CatalogControl::startUp()
 {
     m_state.WorkDBFile.clear();
-    m_stages->GetRegConnParams();
-    m_stages->FillCmbExtraNote();
-    m_stages->FillCmbPriceField();
+    m_stages->GetRegConnParams(m_context);
+    m_stages->FillCmbExtraNote(m_context);
+    m_stages->FillCmbPriceField(m_context);
     m_persistence.SetGetRegParams(LoadAction);
     m_persistence.GetSetFormLabDefs(LoadAction, StoreApp, StoreSection);
 }
 
-void CatalogControl::CmdDef_Click()
+void CatalogControl::saveSettings()
 {
     if (m_running)
         return;
-    m_persistence.CmdDef_Click();
+    m_persistence.saveAll();
 }
 
-void CatalogControl::cmdStop_Click()
+void CatalogControl::requestStop()
 {
     m_state.StopRequested = true;
     m_user.yield();
 }
 
-RunOutcome CatalogControl::cmdRunMailing_Click()
+void CatalogControl::useLastCollection()
+{
+    m_settings.useMarkedItems = true;
+    const QString path = workDatabasePath();
+    m_state.WorkDBFile = QFileInfo(path).isFile() ? path : QString();
+}
+
+RunOutcome CatalogControl::askAndMakeCatalog()
 {
     if (m_running)
         return {};
     if (m_user.ask(CatalogQuestion, CatalogQuestionTitle, QuestionButtons::YesNo) != Answer::Yes)
         return {};
-    return produceCatalog();
+    return makeCatalog();
 }
 
-RunOutcome CatalogControl::CmdPreview_Click()
+RunOutcome CatalogControl::askAndMakeList()
 {
     if (m_running)
         return {};
     bool collectAnew = true;
-    if (isTicked(m_settings.ChkSelectAccount)) {
+    if (m_settings.useMarkedItems) {
         switch (m_user.ask(RescanQuestion, RescanQuestionTitle, QuestionButtons::YesNoCancel)) {
         case Answer::Yes:
             break;
@@ -100,37 +110,72 @@ RunOutcome CatalogControl::CmdPreview_Click()
             return {};
         }
     }
-    return produceList(collectAnew);
+    return makeList(collectAnew);
 }
 
-Status CatalogControl::collect()
+std::optional<RunOutcome> CatalogControl::collect(RunOutcome &outcome)
 {
-    if (m_running)
-        return Status::ok();
-    BusyScope busy(*this);
-    m_state.StopRequested = false;
-    return m_stages->BuildAndCollectData();
+    const Result<CollectionReport> report = m_stages->BuildAndCollectData(m_context);
+    if (!report)
+        return fail(report.status());
+    if (const Status &failure = report->stepFailure; !failure) {
+        // The rows collected before the failed step still make a catalog; the user hears why
+        // it is not complete.
+        m_user.tell(failure.description(), FaultTitle, MessageIcon::Information);
+        outcome = {RunOutcome::Ending::Partial, {}, failure.description()};
+    } else if (report->stopped) {
+        outcome.ending = RunOutcome::Ending::Stopped;
+    }
+    return std::nullopt;
 }
 
-RunOutcome CatalogControl::produceCatalog()
+RunOutcome CatalogControl::collectItems()
 {
     if (m_running)
         return {};
-    // A number the pages cannot use is named before anything is collected or deleted.
-    if (const Status valid = validateNumericSettings(m_settings); !valid)
-        return fail(valid);
+    BusyScope busy(*this);
+    m_state.StopRequested = false;
+    RunOutcome outcome{RunOutcome::Ending::Complete, {}, {}};
+    if (auto ended = collect(outcome))
+        return *ended;
+    return outcome;
+}
+
+RunOutcome CatalogControl::prepareMarking()
+{
+    if (m_running)
+        return {};
+    m_settings.useMarkedItems = true;
+    const bool collectAnew =
+        m_state.WorkDBFile.isEmpty() ||
+        m_user.ask(MarkingRescanQuestion, MarkingRescanTitle, QuestionButtons::YesNo) == Answer::Yes;
+    RunOutcome outcome{RunOutcome::Ending::Complete, {}, {}};
+    if (collectAnew)
+        outcome = collectItems();
+    outcome.file = m_state.WorkDBFile;
+    return outcome;
+}
+
+RunOutcome CatalogControl::makeCatalog()
+{
+    if (m_running)
+        return {};
+    // A grid the pages cannot use is named before anything is collected or deleted.
+    if (const auto grid = readGridSize(m_settings); !grid)
+        return fail(grid.status());
     BusyScope busy(*this);
     // A stop pressed while idle must not cut this run short.
     m_state.StopRequested = false;
-    if (!isTicked(m_settings.ChkSelectAccount)) {
-        if (const Status collected = m_stages->BuildAndCollectData(); !collected)
-            return fail(collected);
+    RunOutcome outcome{RunOutcome::Ending::Complete, {}, {}};
+    if (!m_settings.useMarkedItems) {
+        if (auto ended = collect(outcome))
+            return *ended;
     }
     m_state.StopRequested = false;
-    return CreateCatalog();
+    return CreateCatalog(outcome);
 }
 
-RunOutcome CatalogControl::CreateCatalog()
+RunOutcome CatalogControl::CreateCatalog(RunOutcome outcome)
 {
     if (m_state.WorkDBFile.isEmpty())
         return fail(Status::fault(NoWorkDatabaseText));
@@ -140,31 +185,34 @@ RunOutcome CatalogControl::CreateCatalog()
     if (const Status cleaned = cleanCatalogOutput(m_files, folder); !cleaned)
         return fail(cleaned);
     const QString images = imagesFolderOf(folder);
-    if (m_settings.cmbPageSplit.currentIndex() == 1) {
-        if (const Status copied = m_stages->CollectCatImages(images, m_state.WorkDBFile); !copied)
+    if (m_settings.pageSplit == PageSplit::FilePerPage) {
+        if (const Status copied = m_stages->CollectCatImages(m_context, images, m_state.WorkDBFile); !copied)
             return fail(copied);
     }
-    auto page = m_stages->CreateCatHTML(folder + PagePrefixName, m_state.WorkDBFile, images);
+    auto page = m_stages->CreateCatHTML(m_context, folder + PagePrefixName, m_state.WorkDBFile, images);
     if (!page)
         return fail(page.status());
-    if (const Status styled = m_stages->CreateCSS(folder, true); !styled)
+    if (const Status styled = m_stages->CreateCSS(m_context, folder, true); !styled)
         return fail(styled);
     if (page.value().isEmpty()) {
         m_user.tell(NoItemsText, NoItemsTitle, MessageIcon::Information);
-        return {RunOutcome::Ending::NoItems, {}, NoItemsText};
+        if (outcome.ending != RunOutcome::Ending::Partial)
+            outcome = {RunOutcome::Ending::NoItems, {}, NoItemsText};
+        return outcome;
     }
-    return show(page.value());
+    return show(page.value(), outcome);
 }
 
-RunOutcome CatalogControl::produceList(bool collectAnew)
+RunOutcome CatalogControl::makeList(bool collectAnew)
 {
     if (m_running)
         return {};
     BusyScope busy(*this);
     m_state.StopRequested = false;
+    RunOutcome outcome{RunOutcome::Ending::Complete, {}, {}};
     if (collectAnew) {
-        if (const Status collected = m_stages->BuildAndCollectData(); !collected)
-            return fail(collected);
+        if (auto ended = collect(outcome))
+            return *ended;
     }
     if (m_state.WorkDBFile.isEmpty())
         return fail(Status::fault(NoWorkDatabaseText));
@@ -172,9 +220,9 @@ RunOutcome CatalogControl::produceList(bool collectAnew)
     if (const Status made = ensureFolder(m_files, folder); !made)
         return fail(made);
     const QString file = folder + ListPageName;
-    if (const Status written = m_stages->CreateListHTML(file, m_state.WorkDBFile); !written)
+    if (const Status written = m_stages->CreateListHTML(m_context, file, m_state.WorkDBFile); !written)
         return fail(written);
-    return show(file);
+    return show(file, outcome);
 }
 
 RunOutcome CatalogControl::fail(const Status &status)
@@ -183,14 +231,18 @@ RunOutcome CatalogControl::fail(const Status &status)
     return {RunOutcome::Ending::Failed, {}, status.description()};
 }
 
-RunOutcome CatalogControl::show(const QString &file)
+RunOutcome CatalogControl::show(const QString &file, RunOutcome outcome)
 {
+    // A stop during the writing leaves a shorter result, which is still shown.
+    if (m_state.StopRequested && outcome.ending == RunOutcome::Ending::Complete)
+        outcome.ending = RunOutcome::Ending::Stopped;
     if (const Status opened = m_user.openBrowser(file); !opened) {
-        RunOutcome outcome = fail(opened);
+        outcome = fail(opened);
         outcome.file = file;
         return outcome;
     }
-    return {RunOutcome::Ending::Shown, file, {}};
+    outcome.file = file;
+    return outcome;
 }
 
 } // namespace zorbin

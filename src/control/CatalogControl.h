@@ -1,14 +1,14 @@
 #pragma once
 
 #include "common/Status.h"
-#include "model/CatalogSettings.h"
 #include "control/CatalogStages.h"
+#include "control/RunOutcome.h"
+#include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "model/SettingsPersistence.h"
-#include "model/ConnectionParams.h"
 
-#include <functional>
 #include <memory>
 
 namespace zorbin {
@@ -17,35 +17,22 @@ class FileSystem;
 class SettingsStore;
 class UserPort;
 
-// How a run ended.
-struct RunOutcome
-{
-    enum class Ending {
-        Declined, // the user did not confirm, or another run was in progress
-        Shown,    // the output was written and opened (or, without a browser, written)
-        NoItems,  // the catalog query had no rows: nothing to show
-        Failed,   // a fault ended the run; the user has been told
-    };
-    Ending ending = Ending::Declined;
-    QString file;        // the page that was (or would have been) shown
-    QString description; // the fault's text when Failed
-};
-
-// The catalog control without its widgets: the settings record, the connection parameters and
-// the run state, the start-up, the two runs and the stop request. The settings page (or the
-// command line) owns one, binds to its records and forwards the button presses.
+// The catalog control without its widgets: the options, the connection parameters and the run
+// state, the start-up, the runs and the stop request. The control alone decides, for every
+// failure of a stage, whether the run warns and goes on or ends, and tells the user; the front
+// ends (the settings page, the command line) forward the user's commands and read the outcome.
 //
 // Runs are synchronous; they yield to the host through the UserPort at their progress points.
 // While one runs, another start is refused and the host is told to disable its buttons.
 class CatalogControl
 {
 public:
-    using StagesFactory = std::function<std::unique_ptr<CatalogStages>(RunContext &, SettingsStore &)>;
-
-    // `user`, `store` and `files` must outlive the control. Without a factory the standard
-    // stages (source, working database, output writers) are used.
-    CatalogControl(UserPort &user, SettingsStore &store, FileSystem &files, StagesFactory stages = {});
+    // `user`, `store` and `files` must outlive the control.
+    CatalogControl(UserPort &user, SettingsStore &store, FileSystem &files,
+                   std::unique_ptr<CatalogStages> stages);
     ~CatalogControl();
+    CatalogControl(const CatalogControl &) = delete;
+    CatalogControl &operator=(const CatalogControl &) = delete;
 
     CatalogSettings &settings() { return m_settings; }
     ConnectionParams &connection() { return m_connection; }
@@ -53,36 +40,44 @@ public:
     RunContext &context() { return m_context; }
     SettingsStore &store() { return m_store; }
     SettingsPersistence &persistence() { return m_persistence; }
-    CatalogStages &stages() { return *m_stages; }
     bool isRunning() const { return m_running; }
 
-    // Start-up: each step runs even when an earlier one failed, and none shows a message.
-    // The host then brings its item-range tab to the front.
-    void UserControl_Initialize();
+    // Start-up: the connection, the lists from the accounting database, the stored options.
+    // Each step runs even when an earlier one failed, and none shows a message.
+    void startUp();
+    // Writes the options and the line formats to the store.
+    void saveSettings();
+    // Sets the stop request and yields once; the step that runs ends at its next progress point.
+    void requestStop();
+    // The items marked by hand in the working database the last collection left (the command
+    // line's --use-marked); no collection runs before the output.
+    void useLastCollection();
 
-    // The save button.
-    void CmdDef_Click();
-    // The stop button: sets the stop request and yields once.
-    void cmdStop_Click();
+    // The catalog: asks, then makeCatalog().
+    RunOutcome askAndMakeCatalog();
+    // The item list: asks whether to collect again when the items are marked by hand, then makeList().
+    RunOutcome askAndMakeList();
 
-    // The catalog run: asks, collects unless the items were marked by hand, writes the
-    // catalog and opens its first page.
-    RunOutcome cmdRunMailing_Click();
-    // The item-list run: asks when the items were marked by hand, writes and opens the list.
-    RunOutcome CmdPreview_Click();
-
-    // The two runs after their question, for front ends that confirm in their own way.
-    RunOutcome produceCatalog();
-    RunOutcome produceList(bool collect);
-    // A collection run on its own (the item-selection button uses it).
-    Status collect();
+    // Collects unless the items are marked by hand, writes the catalog and opens its first page.
+    RunOutcome makeCatalog();
+    // Collects when asked to, writes the item list and opens it.
+    RunOutcome makeList(bool collectAnew);
+    // A collection on its own.
+    RunOutcome collectItems();
+    // Before the user marks items by hand: from now on the runs use the marked items; the items
+    // are collected when no collection ran yet or the user asks to collect them again. The
+    // outcome's file is the working database to mark the items in (empty when there is none).
+    RunOutcome prepareMarking();
 
 private:
     class BusyScope;
 
-    RunOutcome CreateCatalog();
+    // The collection of a run: nothing when it may go on (a failed step was told and noted in
+    // `outcome`), the outcome that ends the run otherwise.
+    std::optional<RunOutcome> collect(RunOutcome &outcome);
+    RunOutcome CreateCatalog(RunOutcome outcome);
     RunOutcome fail(const Status &status);
-    RunOutcome show(const QString &file);
+    RunOutcome show(const QString &file, RunOutcome outcome);
 
     UserPort &m_user;
     SettingsStore &m_store;

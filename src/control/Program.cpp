@@ -1,10 +1,8 @@
 #include "control/Program.h"
 
+#include "control/StandardStages.h"
 #include "platform/FileSystem.h"
 #include "workdb/SqliteEngine.h"
-#include "workdb/WorkDatabasePath.h"
-
-#include <QFileInfo>
 
 namespace zorbin {
 
@@ -15,13 +13,7 @@ void prepareProcess()
 
 std::unique_ptr<CatalogControl> assembleControl(UserPort &user, SettingsStore &store)
 {
-    return std::make_unique<CatalogControl>(user, store, localFileSystem());
-}
-
-QString lastWorkDatabase()
-{
-    const QString path = workDatabasePath();
-    return QFileInfo(path).isFile() ? path : QString();
+    return std::make_unique<CatalogControl>(user, store, localFileSystem(), makeStandardStages(store));
 }
 
 } // namespace zorbin

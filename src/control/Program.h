@@ -17,7 +17,4 @@ void prepareProcess();
 // control here and hand it to their front end. `user` and `store` must outlive the control.
 std::unique_ptr<CatalogControl> assembleControl(UserPort &user, SettingsStore &store);
 
-// The working database the last collection of this user left, or the empty text.
-QString lastWorkDatabase();
-
 } // namespace zorbin

@@ -7,7 +7,6 @@
 #include "output/Stylesheet.h"
 #include "source/ChoiceLists.h"
 #include "source/ConnectionStore.h"
-#include "workdb/CollectionRun.h"
 
 namespace zorbin {
 namespace {
@@ -15,40 +14,51 @@ namespace {
 class StandardStages final : public CatalogStages
 {
 public:
-    StandardStages(RunContext &context, SettingsStore &store) : m_context(context), m_store(store) {}
+    explicit StandardStages(SettingsStore &store) : m_store(store) {}
 
-    void GetRegConnParams() override { zorbin::GetRegConnParams(m_store, m_context.connection); }
-    void FillCmbExtraNote() override { zorbin::FillCmbExtraNote(m_context.connection, m_context.settings); }
-    void FillCmbPriceField() override { zorbin::FillCmbPriceField(m_context.connection, m_context.settings); }
-    Status BuildAndCollectData() override { return zorbin::BuildAndCollectData(m_context); }
-    Status CollectCatImages(const QString &imagesFolder, const QString &dbFile) override
+    void GetRegConnParams(RunContext &context) override
     {
-        return zorbin::CollectCatImages(m_context, imagesFolder, dbFile);
+        zorbin::GetRegConnParams(m_store, context.connection);
     }
-    Result<QString> CreateCatHTML(const QString &pagePrefix, const QString &dbFile,
+    void FillCmbExtraNote(RunContext &context) override
+    {
+        zorbin::FillCmbExtraNote(context.connection, context.settings);
+    }
+    void FillCmbPriceField(RunContext &context) override
+    {
+        zorbin::FillCmbPriceField(context.connection, context.settings);
+    }
+    Result<CollectionReport> BuildAndCollectData(RunContext &context) override
+    {
+        return zorbin::BuildAndCollectData(context);
+    }
+    Status CollectCatImages(RunContext &context, const QString &imagesFolder, const QString &dbFile) override
+    {
+        return zorbin::CollectCatImages(context, imagesFolder, dbFile);
+    }
+    Result<QString> CreateCatHTML(RunContext &context, const QString &pagePrefix, const QString &dbFile,
                                   const QString &imagesFolder) override
     {
-        return zorbin::CreateCatHTML(m_context, pagePrefix, dbFile, imagesFolder);
+        return zorbin::CreateCatHTML(context, pagePrefix, dbFile, imagesFolder);
     }
-    Status CreateCSS(const QString &outputFolder, bool replace) override
+    Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace) override
     {
-        return zorbin::CreateCSS(m_context, outputFolder, replace);
+        return zorbin::CreateCSS(context, outputFolder, replace);
     }
-    Status CreateListHTML(const QString &fileName, const QString &dbFile) override
+    Status CreateListHTML(RunContext &context, const QString &fileName, const QString &dbFile) override
     {
-        return zorbin::CreateListHTML(m_context, fileName, dbFile);
+        return zorbin::CreateListHTML(context, fileName, dbFile);
     }
 
 private:
-    RunContext &m_context;
     SettingsStore &m_store;
 };
 
 } // namespace
 
-std::unique_ptr<CatalogStages> makeStandardStages(RunContext &context, SettingsStore &store)
+std::unique_ptr<CatalogStages> makeStandardStages(SettingsStore &store)
 {
-    return std::make_unique<StandardStages>(context, store);
+    return std::make_unique<StandardStages>(store);
 }
 
 } // namespace zorbin

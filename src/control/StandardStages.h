@@ -6,11 +6,10 @@
 
 namespace zorbin {
 
-struct RunContext;
 class SettingsStore;
 
-// The stages of a real run: the accounting database, the working database and the output
-// writers. `context` and `store` must outlive the stages.
-std::unique_ptr<CatalogStages> makeStandardStages(RunContext &context, SettingsStore &store);
+// The stages of a real run: the accounting database, the working database and the writers.
+// `store`, where the connection parameters are kept, must outlive the stages.
+std::unique_ptr<CatalogStages> makeStandardStages(SettingsStore &store);
 
 } // namespace zorbin

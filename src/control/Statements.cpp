@@ -34,37 +34,22 @@ Result<std::vector<std::pair<QString, QString>>> runStatements(RunContext &conte
     statements.emplace_back(QStringLiteral("items"), items.value());
     statements.emplace_back(QStringLiteral("sort-groups"), buildSortGroupStatement());
 
-    struct Step
-    {
-        const char *label;
-        CheckValue use;
-        const ChoiceList &list;
-        const char16_t *what;
-        bool price;
-    };
-    const Step steps[] = {
-        {"price1", settings.chkUsePriceField, settings.cmbPriceField, u"מחירון ראשי", true},
-        {"price2", settings.ChkUsePriceField2, settings.cmbPriceField2, u"מחירון משני", true},
-        {"note1", settings.ChkUseExtraNote1, settings.cmbExtraNote1, u"נתון נוסף 1", false},
-        {"note2", settings.ChkUseExtraNote2, settings.cmbExtraNote2, u"נתון נוסף 2", false},
-    };
-    for (const Step &step : steps) {
-        if (!isTicked(step.use))
+    for (const ChosenList &chosen : chosenLists()) {
+        if (!(settings.*chosen.collect))
             continue;
-        const auto number = chosenNumber(step.list, QString::fromUtf16(step.what));
+        const auto number = chosenNumber(settings.*chosen.list, QString::fromUtf16(chosen.name));
         if (!number)
             return number.status();
-        const auto statement = step.price ? buildPriceStatement(settings, number.value())
-                                          : buildExtraNoteStatement(settings, number.value());
+        const auto statement = chosen.price ? buildPriceStatement(settings, number.value())
+                                            : buildExtraNoteStatement(settings, number.value());
         if (!statement)
             return statement.status();
-        statements.emplace_back(QLatin1String(step.label), statement.value());
+        statements.emplace_back((chosen.price ? QStringLiteral("price") : QStringLiteral("note")) +
+                                    QString::number(chosen.digit),
+                                statement.value());
     }
 
-    const auto catalog = BuildFinalSQL(settings);
-    if (!catalog)
-        return catalog.status();
-    statements.emplace_back(QStringLiteral("catalog"), catalog.value());
+    statements.emplace_back(QStringLiteral("catalog"), BuildFinalSQL(settings));
     return statements;
 }
 

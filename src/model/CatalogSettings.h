@@ -5,119 +5,91 @@
 
 #include <QString>
 #include <array>
+#include <optional>
 
 namespace zorbin {
 
-// The value of a check box: 0 unchecked, 1 checked, 2 grey. Only 1 counts as ticked.
-enum class CheckValue : int { Unchecked = 0, Checked = 1, Grayed = 2 };
+// The catalog order (`CmbSortBy`).
+enum class SortKey { ItemKey = 0, ItemName = 1, SortCode = 2 };
+// The direction of the catalog order (`CmbSortDir`).
+enum class SortDirection { Ascending = 0, Descending = 1 };
+// Which name of an item the catalog shows (`CmbItemNameType`).
+enum class ItemNameSource { Standard = 0, Foreign = 1 };
+// Where the picture file name of an item comes from (`OptPicSource`).
+enum class PictureSource { FileField = 0, ItemKey = 1, ExtraNote = 2 };
+// Where the picture stands in an item's cell (`cmbPicLocation`).
+enum class PictureLocation { AsLine = 0, BesideLines = 1 };
+// Which files the pages go into (`cmbPageSplit`).
+enum class PageSplit { OneFile = 0, FilePerPage = 1 };
 
-inline bool isTicked(CheckValue value)
-{
-    return value == CheckValue::Checked;
-}
-
-// A group of option buttons of which at most one is set; setting one clears the others.
-template <int N> class OptionGroup
-{
-public:
-    bool value(int index) const { return m_values.at(static_cast<std::size_t>(index)); }
-    void setValue(int index, bool set)
-    {
-        if (set)
-            m_values.fill(false);
-        m_values.at(static_cast<std::size_t>(index)) = set;
-    }
-    // The index of the set button (of several, the last); 0 when none is set.
-    int selected() const
-    {
-        int chosen = 0;
-        for (int i = 0; i < N; ++i) {
-            if (m_values[static_cast<std::size_t>(i)])
-                chosen = i;
-        }
-        return chosen;
-    }
-    static constexpr int size() { return N; }
-
-private:
-    std::array<bool, N> m_values{};
-};
-
-// Where the picture reference of an item comes from (`OptPicSource`).
-enum PictureSource : int { PictureFromFileField = 0, PictureFromItemKey = 1, PictureFromExtraNote = 2 };
-
-// Entry limits of the settings page's text boxes, in characters.
-inline constexpr int MaxLengthSortBound = 15;  // txtToSort; txtFromSort has no limit
-inline constexpr int MaxLengthItemBound = 15;  // txtToItem; txtFromItem has no limit
-inline constexpr int MaxLengthGridSize = 3;    // txtRows, txtCols
-inline constexpr int MaxLengthPercent = 2;     // txtTopPercent, txtBottomPercent
-inline constexpr int MaxLengthPictureSize = 3; // txtImageH, txtImageW
-inline constexpr int MaxLengthCutOff = 1;      // each ItemCutOff box
 inline constexpr int CutOffPositions = 10;
 inline constexpr int StoredCutOffPositions = 5;
 
-// Every catalog parameter of the settings page, one member per widget, named after the widget.
-// The record holds the values the widgets show; numbers stay the text the user typed, and
-// each run converts them when it needs them. Members start at the page's initial values
-// (before anything is loaded from the store).
+// Every catalog option, typed as the runs read it. The settings page shows and edits it, the
+// settings store keeps it (catalogOptionTable(), in OptionTable.h, says under which key and in
+// which text form), and the runs read it at the moment they need a value.
 //
-// The record is owned by the control; the settings page binds its widgets to it, the
-// persistence loads and saves it, and the runs read it at the moment they need a value.
+// A list choice is empty when the page's list has no entry selected; its comment says how the
+// runs read that. A number is empty when its box is empty or holds no number.
+//
+// A new record holds the stored defaults, as a first start with an empty store shows them. It
+// is owned by the control; the settings page binds its widgets to it.
 struct CatalogSettings
 {
     CatalogSettings();
     CatalogSettings(const CatalogSettings &) = delete;
     CatalogSettings &operator=(const CatalogSettings &) = delete;
 
-    // Item range tab ("טווח הפריטים").
-    CheckValue ChkCatCode = CheckValue::Unchecked; // restrict to a range of sort codes
-    QString txtFromSort;
-    QString txtToSort;
-    CheckValue chkFilter = CheckValue::Unchecked;    // apply the cut-off pattern
-    std::array<QString, CutOffPositions> ItemCutOff; // ItemCutOff[p - 1] is position p; "*" at first
-    CheckValue ChkItemKey = CheckValue::Unchecked;   // restrict to a range of item keys
-    QString txtFromItem;
-    QString txtToItem;
-    ChoiceList CmbSortBy;                                // 0 item key, 1 item name, 2 sort code
-    ChoiceList CmbSortDir;                               // 0 ascending, 1 descending
-    CheckValue ChkSelectAccount = CheckValue::Unchecked; // use the items marked by hand; not stored
+    // The items: ranges, pattern and order ("טווח הפריטים").
+    bool sortCodeRange = false; // only the items whose sort code lies from sortCodeFrom to sortCodeTo
+    QString sortCodeFrom;       // as typed: a whole number, or empty for no bound
+    QString sortCodeTo;
+    bool cutOffFilter = false;                   // only the items whose filter field fits cutOff
+    std::array<QString, CutOffPositions> cutOff; // one character a position; "*" or empty for any
+    bool itemKeyRange = false; // only the items whose key lies from itemKeyFrom to itemKeyTo
+    QString itemKeyFrom;       // as typed; empty for no bound
+    QString itemKeyTo;
+    std::optional<SortKey> sortKey;             // empty: by item key
+    std::optional<SortDirection> sortDirection; // empty: the engine's own order, ascending
+    bool useMarkedItems = false; // the items marked by hand in the last working database; not stored
 
-    // Data tab ("הגדרות נתונים").
-    ChoiceList CmbItemNameType; // 0 standard name, 1 foreign name
-    CheckValue chkUsePriceField = CheckValue::Unchecked;
-    CheckValue ChkUsePriceField2 = CheckValue::Unchecked;
-    ChoiceList cmbPriceField; // filled from the accounting database; entry 0 the item's own price
-    ChoiceList cmbPriceField2;
-    CheckValue ChkUseExtraNote1 = CheckValue::Unchecked;
-    CheckValue ChkUseExtraNote2 = CheckValue::Unchecked;
-    ChoiceList cmbExtraNote1; // filled from the accounting database
-    ChoiceList cmbExtraNote2;
-    OptionGroup<3> OptPicSource; // see PictureSource
-    ChoiceList cmbPicExtraNote;  // filled from the accounting database
-    QString txtPicPath;          // folder of pictures named by item key
-    QString txtPicExtension;
+    // The data of each item ("הגדרות נתונים").
+    std::optional<ItemNameSource> itemName; // empty: the standard name
+    bool collectPrice1 = false;
+    bool collectPrice2 = false;
+    ChoiceList priceList1; // the price lists of the accounting database; entry 0 the item's own price
+    ChoiceList priceList2;
+    bool collectNote1 = false;
+    bool collectNote2 = false;
+    ChoiceList extraNote1; // the extra-note kinds of the accounting database
+    ChoiceList extraNote2;
+    std::optional<PictureSource> pictureSource; // empty: the item's file field
+    ChoiceList pictureNote;                     // the extra note that names the picture
+    QString pictureFolder;                      // the folder of the pictures named by item key, as typed
+    QString pictureExtension;                   // appended to the item key, as typed
 
-    // Page tab ("הגדרת עמוד בקטלוג").
-    CellLines lines; // caption = txtLineCaption(i), tag = lblLine(i), format = the format table
-    QString txtRows;
-    QString txtCols;
-    ChoiceList cmbPicLocation;                   // 0 according to the table, 1 to the right of the data
-    ChoiceList cmbPageSplit;                     // 0 one file, 1 a file per page
-    CheckValue chkRules = CheckValue::Unchecked; // a frame around every item
-    QString txtImageH; // largest picture height in pixels; empty for no size attributes
-    QString txtImageW;
-    CheckValue ChkOnlyWithPic = CheckValue::Unchecked; // only items that have a picture; not stored
+    // The page ("הגדרת עמוד בקטלוג").
+    CellLines lines;
+    std::optional<int> rows; // cells per page, down and across; a run refuses empty or below 1
+    std::optional<int> columns;
+    std::optional<PictureLocation> pictureLocation; // empty: as a line
+    std::optional<PageSplit> pageSplit;             // empty: one file
+    bool frameItems = false;                        // a frame around every item
+    std::optional<int> pictureHeight; // the largest picture in pixels; pictures get sizes only when
+    std::optional<int> pictureWidth;  // both are above 0, an empty one counts as 0
+    bool onlyWithPicture = false;     // only the items that have a picture; not stored
 
-    // Titles tab ("כותרות לעמוד").
-    QString txtTopTitle;
-    QString txtTopTitle2;
-    QString txtBottomTitle;
-    QString txtLogo; // path of the logo picture; empty for none
-    QString txtTopPercent;
-    QString txtBottomPercent;
+    // The titles ("כותרות לעמוד").
+    QString topTitle; // as typed: it may hold markup on purpose
+    QString topTitle2;
+    QString bottomTitle;
+    QString logo;                     // the logo picture's path; empty for none
+    std::optional<int> topPercent;    // band heights in percent of the page; 0 or less, or
+    std::optional<int> bottomPercent; // empty, leaves the band out
+    bool webSections = true;          // the web catalog groups its items by sort group
 
-    // General tab ("כללי").
-    QString txtPagingPath; // output folder; empty means the temporary folder
+    // General ("כללי").
+    QString outputFolder; // empty: the temporary folder
 
     // The lists filled from the accounting database, in the order the start-up fills them.
     std::array<ChoiceList *, 5> sourceLists();

@@ -12,20 +12,14 @@ std::optional<int> fieldOfTag(const QString &tag)
     return static_cast<int>(*number);
 }
 
-std::optional<int> CellLine::field() const
-{
-    return fieldOfTag(tag);
-}
-
 QString CellLine::slotCaption() const
 {
-    const auto number = field();
-    return number ? catalogFields()[static_cast<std::size_t>(*number)].caption : QString();
+    return field ? catalogFields()[static_cast<std::size_t>(*field)].caption : QString();
 }
 
 LabelColours CellLine::slotColours() const
 {
-    return field() ? paletteColours() : emptySlotColours();
+    return field ? paletteColours() : emptySlotColours();
 }
 
 } // namespace zorbin

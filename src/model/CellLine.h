@@ -13,7 +13,9 @@ inline constexpr int CellLineCount = 9;
 
 // The text format of one cell line. Each byte is the list index the editor offers:
 // font 0 Arial, 1 David, 2 Miriam; weight 0 regular, 1 bold, 2 heavy; align 0 right,
-// 1 centre, 2 left; underline and italic 0 or 1; size in points.
+// 1 centre, 2 left; underline and italic 0 or 1; size in points. The store may hold any
+// byte; a writer that meets an index it has no word for treats it as the list does not
+// (no font, weight or alignment of its own).
 struct CellFormat
 {
     std::uint8_t font = 0;
@@ -28,14 +30,11 @@ struct CellFormat
 // One of the nine line slots of a catalog cell, index 0 (the top line) to 8.
 struct CellLine
 {
-    QString caption;   // `txtLineCaption(i)`: fixed text printed before the value
-    QString tag;       // `lblLine(i)` tag: a CatalogField number as text, or empty for no field
-    CellFormat format; // the line's record in the format table
+    QString caption;          // fixed text printed before the value; empty for none
+    std::optional<int> field; // the CatalogField the line shows (0 to 8); none for an empty line
+    CellFormat format;        // the line's record in the format table
 
-    bool isUsed() const { return !tag.isEmpty(); }
-    // The field the slot shows: its tag read as a CatalogField number; nothing for an empty
-    // tag or one that names no field.
-    std::optional<int> field() const;
+    bool isUsed() const { return field.has_value(); }
     // What the slot label shows: the field's caption, or the empty text.
     QString slotCaption() const;
     LabelColours slotColours() const;
@@ -43,7 +42,7 @@ struct CellLine
 
 using CellLines = std::array<CellLine, CellLineCount>;
 
-// A tag text as a CatalogField number: a whole number from 0 to 8, or nothing.
+// A stored line tag as a CatalogField number: a whole number from 0 to 8, or nothing.
 std::optional<int> fieldOfTag(const QString &tag);
 
 } // namespace zorbin

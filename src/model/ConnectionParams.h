@@ -5,12 +5,13 @@
 
 namespace zorbin {
 
-// How the accounting database is reached (the `CmbConnType` list index + 1).
-enum ConnectionType : std::int16_t {
-    NoConnectionType = 0, // nothing chosen: every connection attempt fails
-    OdbcConnection = 1,   // "MS-SQL Server Via ODBC"
-    OleDbConnection = 2,  // "MS-SQL Server Via OLE-DB"
-    FileConnection = 3,   // "DAO 4.0 Via OLE-DB": a database file
+// How the accounting database is reached: the connection dialog's list index + 1. A stored
+// number that is none of these connects to nothing.
+enum class ConnectionKind : std::int16_t {
+    None = 0,  // nothing chosen: every connection attempt fails
+    Odbc = 1,  // "MS-SQL Server Via ODBC"
+    OleDb = 2, // "MS-SQL Server Via OLE-DB"
+    File = 3,  // "DAO 4.0 Via OLE-DB": a database file
 };
 
 // The accounting-database connection parameters, one instance per control.
@@ -20,7 +21,7 @@ struct ConnectionParams
     QString user;     // login name; empty selects integrated security for OLE DB
     QString password; // kept in the settings store as plain text, as earlier versions did
     QString database; // database on the server; for a database file, the file name
-    std::int16_t type = NoConnectionType;
+    ConnectionKind kind = ConnectionKind::None;
 };
 
 } // namespace zorbin

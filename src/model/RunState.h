@@ -12,8 +12,6 @@ struct RunState
     QString WorkDBFile;
     // Set by the stop button; the long steps test it at each progress point and end early.
     bool StopRequested = false;
-    // Set by a collection step that met an error; the collection run stops its later steps.
-    bool CollectFailed = false;
 };
 
 } // namespace zorbin

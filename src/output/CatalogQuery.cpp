@@ -1,14 +1,13 @@
 #include "output/CatalogQuery.h"
 
-#include "common/Numbers.h"
 #include "model/CatalogSettings.h"
 
 #include <QStringList>
-#include <limits>
 
 namespace zorbin {
 namespace {
 
+// Price list entry 0 is the item's own price, which the item step collects into tItems.
 QString priceColumns(int list, int priceListIndex)
 {
     const QString n = QString::number(list);
@@ -41,9 +40,9 @@ QString columnsOfField(int field, const CatalogSettings &settings)
                QStringLiteral(" Where tItemSort.ItemSort = tItems.ItemSort)") +
                QStringLiteral(" As SortName");
     case 4:
-        return priceColumns(1, settings.cmbPriceField.currentIndex());
+        return priceColumns(1, settings.priceList1.currentIndex());
     case 5:
-        return priceColumns(2, settings.cmbPriceField2.currentIndex());
+        return priceColumns(2, settings.priceList2.currentIndex());
     case 6:
         return QStringLiteral(", tItems.Unit");
     case 7:
@@ -57,33 +56,21 @@ QString columnsOfField(int field, const CatalogSettings &settings)
 
 } // namespace
 
-Result<std::vector<LineField>> usedLineFields(const CatalogSettings &settings)
+std::vector<LineField> usedLineFields(const CatalogSettings &settings)
 {
     std::vector<LineField> used;
     for (int i = 0; i < CellLineCount; ++i) {
-        const CellLine &line = settings.lines[static_cast<std::size_t>(i)];
-        if (!line.isUsed())
-            continue;
-        const auto number =
-            toWholeNumber(line.tag, std::numeric_limits<int>::min(), std::numeric_limits<int>::max());
-        if (!number)
-            return Status::fault(QStringLiteral("שורה %1 בתא מסומנת בשדה \"%2\", שאינו מספר שדה. יש לגרור אל "
-                                                "השורה שדה מרשימת השדות או לנקות אותה.")
-                                     .arg(i + 1)
-                                     .arg(line.tag));
-        used.push_back({i, static_cast<int>(*number)});
+        if (const std::optional<int> field = settings.lines[static_cast<std::size_t>(i)].field)
+            used.push_back({i, *field});
     }
     return used;
 }
 
-Result<QString> BuildSelect(const CatalogSettings &settings)
+QString BuildSelect(const CatalogSettings &settings)
 {
-    const auto lines = usedLineFields(settings);
-    if (!lines)
-        return lines.status();
     QString select = QStringLiteral("SELECT tItems.ItemKey, tItems.ItemName, tItems.ItemSort");
     QStringList pieces;
-    for (const LineField &line : lines.value()) {
+    for (const LineField &line : usedLineFields(settings)) {
         const QString piece = columnsOfField(line.field, settings);
         // Two lines may show one field; one copy of its columns serves both.
         if (!piece.isEmpty() && !pieces.contains(piece))
@@ -97,38 +84,28 @@ Result<QString> BuildSelect(const CatalogSettings &settings)
 QString BuildOrderBy(const CatalogSettings &settings)
 {
     QString field;
-    switch (settings.CmbSortBy.currentIndex()) {
-    case 1:
+    switch (settings.sortKey.value_or(SortKey::ItemKey)) {
+    case SortKey::ItemKey:
+        field = QStringLiteral("tItems.ItemKey");
+        break;
+    case SortKey::ItemName:
         field = QStringLiteral("tItems.ItemName");
         break;
-    case 2:
+    case SortKey::SortCode:
         field = QStringLiteral("tItems.ItemSort");
-        break;
-    default:
-        field = QStringLiteral("tItems.ItemKey");
         break;
     }
     QString direction;
-    switch (settings.CmbSortDir.currentIndex()) {
-    case 0:
-        direction = QStringLiteral("ASC");
-        break;
-    case 1:
-        direction = QStringLiteral("DESC");
-        break;
-    default:
-        break;
-    }
+    if (settings.sortDirection)
+        direction = *settings.sortDirection == SortDirection::Descending ? QStringLiteral("DESC")
+                                                                         : QStringLiteral("ASC");
     return QStringLiteral(" ORDER BY ") + field + QStringLiteral(" ") + direction;
 }
 
-Result<QString> BuildFinalSQL(const CatalogSettings &settings)
+QString BuildFinalSQL(const CatalogSettings &settings)
 {
-    auto select = BuildSelect(settings);
-    if (!select)
-        return select.status();
-    QString sql = std::move(select).value() + QStringLiteral(" WHERE tItems.Include = True");
-    if (isTicked(settings.ChkOnlyWithPic))
+    QString sql = BuildSelect(settings) + QStringLiteral(" WHERE tItems.Include = True");
+    if (settings.onlyWithPicture)
         sql +=
             QStringLiteral(" And tItems.ItemPic <> '?'") + QStringLiteral(" And Not tItems.ItemPic Is Null");
     return sql + BuildOrderBy(settings);

@@ -19,8 +19,8 @@ struct CatalogSettings;
 // The select list and the FROM clause: the three fixed columns (ItemKey, ItemName, ItemSort),
 // then one piece per used cell line in line order for the columns that line needs (ItemPic,
 // SortName, Price1/Coin1, Price2/Coin2, Unit, ExtraNote1, ExtraNote2). A field that several
-// lines show is selected once. Fails when a line's tag is not a whole number.
-Result<QString> BuildSelect(const CatalogSettings &settings);
+// lines show is selected once.
+QString BuildSelect(const CatalogSettings &settings);
 
 // " ORDER BY " + sort field + " " + direction. A sort field list without a selection sorts by
 // item key, its first entry, so that the statement stays valid; a direction list without a
@@ -29,18 +29,16 @@ QString BuildOrderBy(const CatalogSettings &settings);
 
 // BuildSelect + " WHERE tItems.Include = True" (+ the picture conditions when only items with
 // a picture are wanted) + BuildOrderBy.
-Result<QString> BuildFinalSQL(const CatalogSettings &settings);
+QString BuildFinalSQL(const CatalogSettings &settings);
 
-// A cell line that shows something, and the field number its tag holds. A number outside the
-// catalog fields (0 to 8) is kept as it is; each caller decides what it shows.
+// A cell line that shows a field.
 struct LineField
 {
     int index = 0; // 0 to 8
-    int field = 0;
+    int field = 0; // the CatalogField number, 0 to 8
 };
 
-// The used cell lines (tag not empty) in index order. Fails, with a message that names the
-// line, at the first tag that is not a whole number.
-Result<std::vector<LineField>> usedLineFields(const CatalogSettings &settings);
+// The used cell lines in index order.
+std::vector<LineField> usedLineFields(const CatalogSettings &settings);
 
 } // namespace zorbin

@@ -10,23 +10,21 @@ namespace zorbin {
 
 Result<std::unique_ptr<CatalogRows>> CatalogRows::open(const QString &dbFile, const CatalogSettings &settings)
 {
-    const auto sql = BuildFinalSQL(settings);
-    if (!sql)
-        return sql.status();
+    const QString sql = BuildFinalSQL(settings);
     auto database = WorkDatabase::open(dbFile);
     if (!database)
         return database.status();
     long long count = 0;
     {
-        auto counted = database.value()->select(QStringLiteral("SELECT COUNT(*) FROM (") + sql.value() +
-                                                QStringLiteral(")"));
+        auto counted =
+            database.value()->select(QStringLiteral("SELECT COUNT(*) FROM (") + sql + QStringLiteral(")"));
         if (!counted)
             return counted.status();
         if (!counted.value().next())
             return Status::fault(counted.value().lastError().text());
         count = counted.value().value(0).toLongLong();
     }
-    auto rows = database.value()->select(sql.value());
+    auto rows = database.value()->select(sql);
     if (!rows)
         return rows.status();
     return std::unique_ptr<CatalogRows>(

@@ -23,15 +23,13 @@ const QString NoPicture = QStringLiteral("?");
 // line shows the picture (the statement then has no ItemPic column).
 Result<QStringList> pictureReferences(const CatalogSettings &settings, const QString &dbFile)
 {
-    const Result<QString> sql = BuildFinalSQL(settings);
-    if (!sql)
-        return sql.status();
+    const QString sql = BuildFinalSQL(settings);
     auto database = WorkDatabase::open(dbFile);
     if (!database)
         return database.status();
     QStringList references;
     {
-        Result<QSqlQuery> query = database.value()->select(sql.value());
+        Result<QSqlQuery> query = database.value()->select(sql);
         if (!query)
             return query.status();
         const int column = query->record().indexOf(QStringLiteral("ItemPic"));
@@ -53,7 +51,7 @@ Status CollectCatImages(RunContext &context, const QString &imagesFolder, const 
     progress.reset();
     images::PictureCopier copier(context.files, imagesFolder);
 
-    const QString &logo = context.settings.txtLogo;
+    const QString &logo = context.settings.logo;
     if (!logo.isEmpty() && context.files.fileExists(logo)) {
         if (const Status copied = copier.copy(logo, ImageFileName(imagesFolder, logo)); !copied)
             return copied;

@@ -11,7 +11,7 @@ namespace zorbin {
 
 QString outputFolderOf(const CatalogSettings &settings)
 {
-    const QString folder = settings.txtPagingPath.isEmpty() ? temporaryFolder() : settings.txtPagingPath;
+    const QString folder = settings.outputFolder.isEmpty() ? temporaryFolder() : settings.outputFolder;
     return withTrailingSeparator(folder);
 }
 

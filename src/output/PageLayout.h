@@ -1,7 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
-#include "output/GridSize.h"
+#include "model/GridSize.h"
 
 #include <QString>
 #include <vector>

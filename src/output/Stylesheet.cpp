@@ -1,10 +1,10 @@
 #include "output/Stylesheet.h"
 
 #include "model/CatalogSettings.h"
-#include "output/OutputFolder.h"
+#include "model/GridSize.h"
 #include "model/RunContext.h"
 #include "output/CatalogQuery.h"
-#include "output/GridSize.h"
+#include "output/OutputFolder.h"
 #include "platform/FileSystem.h"
 #include "platform/Paths.h"
 #include "platform/ValueFormat.h"
@@ -67,9 +67,6 @@ Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace)
         QStringLiteral("height:") + formatOneDecimal(100.0 / grid->rows) + QStringLiteral("%");
     const QString width =
         QStringLiteral("width:") + formatOneDecimal(100.0 / grid->columns) + QStringLiteral("%");
-    const auto used = usedLineFields(settings); // the tags must be numbers; their values are not used here
-    if (!used)
-        return used.status();
 
     const QString path = withTrailingSeparator(outputFolder) + StylesheetName;
     if (!replace && context.files.fileExists(path))
@@ -89,11 +86,11 @@ Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace)
     css.writeLine(u".Top1 {font-family:Arial; font-weight:Normal; font-size:12pt; color:black;}");
     css.writeLine(u".Top2 {font-family:Arial; font-weight:Normal; font-size:11pt; color:black;}");
     css.writeLine(u".Bot1 {font-family:Arial; font-weight:Normal; font-size:11pt; color:black;}");
-    for (const LineField &line : used.value())
+    for (const LineField &line : usedLineFields(settings))
         writeLineClass(css, line.index, settings.lines[static_cast<std::size_t>(line.index)].format);
     css.write(QStringLiteral(" .D1 {") + width + QStringLiteral("; ") + height +
               QStringLiteral("; text-align: center"));
-    if (isTicked(settings.chkRules))
+    if (settings.frameItems)
         css.write(u"; border: thin solid; border-collapse: collapse");
     css.writeLine(u"}");
     return css.close();

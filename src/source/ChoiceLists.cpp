@@ -79,7 +79,7 @@ void FillCmbExtraNote(const ConnectionParams &connection, CatalogSettings &setti
 {
     const QString sql = QStringLiteral("SELECT NoteID, NoteName") + QStringLiteral(" FROM ExtraNoteNames") +
                         QStringLiteral(" Where ItemFlag = 1") + QStringLiteral(" Order By NoteID");
-    ChoiceList *lists[] = {&settings.cmbPicExtraNote, &settings.cmbExtraNote1, &settings.cmbExtraNote2};
+    ChoiceList *lists[] = {&settings.pictureNote, &settings.extraNote1, &settings.extraNote2};
     fillFromNames(
         connection, sql, QStringLiteral("NoteID"), QStringLiteral("NoteName"),
         [&] {
@@ -94,7 +94,7 @@ void FillCmbExtraNote(const ConnectionParams &connection, CatalogSettings &setti
 
 void FillCmbPriceField(const ConnectionParams &connection, CatalogSettings &settings)
 {
-    ChoiceList *lists[] = {&settings.cmbPriceField, &settings.cmbPriceField2};
+    ChoiceList *lists[] = {&settings.priceList1, &settings.priceList2};
     fillFromNames(
         connection, QStringLiteral("SELECT * FROM PriceListNames"), QStringLiteral("PriceListID"),
         QStringLiteral("PriceListName"),

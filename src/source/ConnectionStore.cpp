@@ -10,8 +10,12 @@ namespace {
 
 void loadText(SettingsStore &store, const QString &key, QString &field, const QString &fallback)
 {
-    SetGetRegControlValue(LoadAction, store, StoreApp, StoreSection, key, ControlProperty::text(field),
-                          fallback);
+    const StoreValue value{[&field] { return field; },
+                           [&field](const QString &text) {
+                               field = text;
+                               return true;
+                           }};
+    SetGetRegControlValue(LoadAction, store, StoreApp, StoreSection, key, value, fallback);
 }
 
 } // namespace
@@ -41,7 +45,7 @@ void GetRegConnParams(SettingsStore &store, ConnectionParams &params)
     QString storedIndex;
     loadText(store, ConnTypeKey, storedIndex, DefaultConnTypeIndex);
     if (const auto type = connTypeFromStoredIndex(storedIndex))
-        params.type = *type;
+        params.kind = static_cast<ConnectionKind>(*type);
 }
 
 } // namespace zorbin

@@ -99,12 +99,12 @@ QString odbcLogin(const QString &user, const QString &password)
 } // namespace
 
 QString BuildConnString(const QString &server, const QString &user, const QString &password,
-                        const QString &database, std::int16_t type)
+                        const QString &database, ConnectionKind kind)
 {
-    switch (type) {
-    case OdbcConnection:
+    switch (kind) {
+    case ConnectionKind::Odbc:
         return sqlServerOdbc(server, odbcLogin(user, password), database);
-    case OleDbConnection:
+    case ConnectionKind::OleDb:
         if (user.isEmpty())
             return QStringLiteral("Provider=sqloledb;Data Source=") + oleDbConnValue(server) +
                    QStringLiteral(";Integrated Security=SSPI") +
@@ -113,17 +113,18 @@ QString BuildConnString(const QString &server, const QString &user, const QStrin
         return QStringLiteral("Provider=sqloledb;Data Source=") + oleDbConnValue(server) +
                QStringLiteral(";User Id=") + oleDbConnValue(user) + QStringLiteral(";Password=") +
                oleDbConnValue(password) + QStringLiteral(";Initial Catalog=") + oleDbConnValue(database);
-    case FileConnection:
+    case ConnectionKind::File:
         return QStringLiteral("Provider=Microsoft.Jet.OLEDB.4.0;Data Source=") +
                oleDbConnValue(databaseFilePath(server, database));
-    default:
-        return {};
+    case ConnectionKind::None:
+        break;
     }
+    return {};
 }
 
 QString BuildConnString(const ConnectionParams &params)
 {
-    return BuildConnString(params.server, params.user, params.password, params.database, params.type);
+    return BuildConnString(params.server, params.user, params.password, params.database, params.kind);
 }
 
 bool isOleDbConnString(const QString &connectionString)

@@ -21,7 +21,7 @@ namespace zorbin {
 // A null password counts as empty. Values go in as typed, except that a value which would break
 // the string is quoted (see odbcConnValue and oleDbConnValue). Pure.
 QString BuildConnString(const QString &server, const QString &user, const QString &password,
-                        const QString &database, std::int16_t type);
+                        const QString &database, ConnectionKind kind);
 QString BuildConnString(const ConnectionParams &params);
 
 // A value as the ODBC form writes it: unchanged, or between braces with every "}" doubled when

@@ -1,10 +1,13 @@
 #include "source/LogonForm.h"
 
+#include "common/Numbers.h"
 #include "model/SettingsPersistence.h"
 #include "platform/SettingsStore.h"
 #include "source/ConnectionStore.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
+
+#include <tuple>
 
 namespace zorbin {
 
@@ -26,17 +29,17 @@ void LogonForm::Form_Load(const ConnectionParams &params)
     txtConnUID = params.user;
     txtConnPWD = params.password;
     txtConnDatabase = params.database;
-    CmbConnType.setCurrentIndex(params.type - 1);
+    CmbConnType.setCurrentIndex(static_cast<int>(params.kind) - 1);
 }
 
-std::int16_t LogonForm::connectionType() const
+ConnectionKind LogonForm::connectionKind() const
 {
-    return static_cast<std::int16_t>(CmbConnType.currentIndex() + 1);
+    return static_cast<ConnectionKind>(CmbConnType.currentIndex() + 1);
 }
 
 QString LogonForm::connectionString() const
 {
-    return BuildConnString(txtConnServer, txtConnUID, txtConnPWD, txtConnDatabase, connectionType());
+    return BuildConnString(txtConnServer, txtConnUID, txtConnPWD, txtConnDatabase, connectionKind());
 }
 
 Status LogonForm::CmdCheck_Click()
@@ -58,24 +61,34 @@ void LogonForm::cmdOK_Click(ConnectionParams &params, SettingsStore &store)
     params.user = txtConnUID;
     params.password = txtConnPWD;
     params.database = txtConnDatabase;
-    params.type = connectionType();
+    params.kind = connectionKind();
     SetGetRegConnParams(SaveAction, store);
     store.flush();
 }
 
 void LogonForm::SetGetRegConnParams(std::uint8_t action, SettingsStore &store)
 {
-    using P = ControlProperty;
-    const StoredSetting values[] = {
-        {ConnServerKey, P::text(txtConnServer), DefaultConnServer},
-        {ConnUserKey, P::text(txtConnUID), DefaultConnUser},
-        {ConnPasswordKey, P::text(txtConnPWD), QString()},
-        {ConnDatabaseKey, P::text(txtConnDatabase), DefaultConnDatabase},
-        {ConnTypeKey, P::listIndex(CmbConnType), DefaultConnTypeIndex},
+    auto text = [](QString &field) {
+        return StoreValue{[&field] { return field; },
+                          [&field](const QString &stored) {
+                              field = stored;
+                              return true;
+                          }};
     };
-    for (const StoredSetting &value : values)
-        SetGetRegControlValue(action, store, StoreApp, StoreSection, value.key, value.property,
-                              value.fallback);
+    const StoreValue listIndex{[this] { return QString::number(CmbConnType.currentIndex()); },
+                               [this](const QString &stored) {
+                                   const auto index = toInt16(stored);
+                                   return index && CmbConnType.setCurrentIndex(*index);
+                               }};
+    const std::tuple<QString, StoreValue, QString> values[] = {
+        {ConnServerKey, text(txtConnServer), DefaultConnServer},
+        {ConnUserKey, text(txtConnUID), DefaultConnUser},
+        {ConnPasswordKey, text(txtConnPWD), QString()},
+        {ConnDatabaseKey, text(txtConnDatabase), DefaultConnDatabase},
+        {ConnTypeKey, listIndex, DefaultConnTypeIndex},
+    };
+    for (const auto &[key, value, fallback] : values)
+        SetGetRegControlValue(action, store, StoreApp, StoreSection, key, value, fallback);
 }
 
 } // namespace zorbin

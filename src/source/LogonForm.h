@@ -47,8 +47,8 @@ public:
 
     // The connection string of the form's values.
     QString connectionString() const;
-    // The type the form's list selects: the list index + 1, 0 when none is selected.
-    std::int16_t connectionType() const;
+    // The kind the form's list selects: the list index + 1, none when no entry is selected.
+    ConnectionKind connectionKind() const;
 
     static const QString RecommendTestText; // what `LblMsg` shows when the dialog opens
     static const QString TestSucceededText;

@@ -49,7 +49,7 @@ QString filterPattern(const CatalogSettings &settings)
 {
     QString pattern;
     bool anySet = false;
-    for (const QString &box : settings.ItemCutOff) {
+    for (const QString &box : settings.cutOff) {
         const QString text = box.trimmed();
         if (text.isEmpty() || text == QLatin1String("*")) {
             pattern += QLatin1Char('_');
@@ -66,23 +66,23 @@ QString filterPattern(const CatalogSettings &settings)
 Result<QString> BuildSourceDBCriteria(const CatalogSettings &settings)
 {
     QString criteria = QStringLiteral(" And Items.ItemKey <> '#' And Items.ItemKey <> '*'");
-    if (isTicked(settings.ChkCatCode)) {
-        if (Status status = appendSortBound(criteria, settings.txtFromSort, QStringLiteral(">="),
+    if (settings.sortCodeRange) {
+        if (Status status = appendSortBound(criteria, settings.sortCodeFrom, QStringLiteral(">="),
                                             QStringLiteral("מקוד מיון"));
             !status)
             return status;
-        if (Status status = appendSortBound(criteria, settings.txtToSort, QStringLiteral("<="),
+        if (Status status = appendSortBound(criteria, settings.sortCodeTo, QStringLiteral("<="),
                                             QStringLiteral("עד קוד מיון"));
             !status)
             return status;
     }
-    if (isTicked(settings.chkFilter)) {
+    if (settings.cutOffFilter) {
         if (const QString pattern = filterPattern(settings); !pattern.isEmpty())
             criteria += QStringLiteral(" And Items.Filter Like ") + quoted(pattern);
     }
-    if (isTicked(settings.ChkItemKey)) {
-        appendKeyBound(criteria, settings.txtFromItem, QStringLiteral(">="));
-        appendKeyBound(criteria, settings.txtToItem, QStringLiteral("<="));
+    if (settings.itemKeyRange) {
+        appendKeyBound(criteria, settings.itemKeyFrom, QStringLiteral(">="));
+        appendKeyBound(criteria, settings.itemKeyTo, QStringLiteral("<="));
     }
     return criteria;
 }

@@ -18,69 +18,65 @@ Status nothingChosen(const QString &what)
                              .arg(what));
 }
 
-namespace {
-
-// A price list or extra note that the run collects when its check box is ticked.
-struct ChosenList
+std::span<const ChosenList> chosenLists()
 {
-    CheckValue CatalogSettings::*use;
-    ChoiceList CatalogSettings::*list;
-    void (*fill)(RunContext &, const QString &, std::int16_t, std::int32_t);
-    std::int16_t digit;
-    const char16_t *status;
-    const char16_t *name;
-};
+    static const ChosenList lists[] = {
+        {&CatalogSettings::collectPrice1, &CatalogSettings::priceList1, true, 1, u"סורק מחירון ראשי",
+         u"מחירון ראשי"},
+        {&CatalogSettings::collectPrice2, &CatalogSettings::priceList2, true, 2, u"סורק מחירון משני",
+         u"מחירון משני"},
+        {&CatalogSettings::collectNote1, &CatalogSettings::extraNote1, false, 1, u"סורק נתון נוסף 1",
+         u"נתון נוסף 1"},
+        {&CatalogSettings::collectNote2, &CatalogSettings::extraNote2, false, 2, u"סורק נתון נוסף 2",
+         u"נתון נוסף 2"},
+    };
+    return lists;
+}
 
-// In the order of the run, which does not depend on the settings.
-const ChosenList ChosenLists[] = {
-    {&CatalogSettings::chkUsePriceField, &CatalogSettings::cmbPriceField, &FillDBItemPrice, 1,
-     u"סורק מחירון ראשי", u"מחירון ראשי"},
-    {&CatalogSettings::ChkUsePriceField2, &CatalogSettings::cmbPriceField2, &FillDBItemPrice, 2,
-     u"סורק מחירון משני", u"מחירון משני"},
-    {&CatalogSettings::ChkUseExtraNote1, &CatalogSettings::cmbExtraNote1, &FillDBItemExtraNote, 1,
-     u"סורק נתון נוסף 1", u"נתון נוסף 1"},
-    {&CatalogSettings::ChkUseExtraNote2, &CatalogSettings::cmbExtraNote2, &FillDBItemExtraNote, 2,
-     u"סורק נתון נוסף 2", u"נתון נוסף 2"},
-};
-
-} // namespace
-
-Status BuildAndCollectData(RunContext &context)
+Result<CollectionReport> BuildAndCollectData(RunContext &context)
 {
     Result<std::unique_ptr<CollectionLock>> lock = CollectionLock::acquire(workDatabasePath());
     if (!lock)
         return lock.status();
     RunState &state = context.state;
-    CatalogSettings &settings = context.settings;
-    state.CollectFailed = false;
+    const CatalogSettings &settings = context.settings;
 
     context.user.showStatus(QStringLiteral("מאתחל בסיס נתונים זמני"));
-    state.WorkDBFile = CreateWorkDB(context);
+    // The last collection's database goes first, so no run reads it as this collection's.
+    state.WorkDBFile.clear();
+    Result<QString> created = CreateWorkDB(context);
+    if (!created)
+        return created.status();
+    state.WorkDBFile = created.value();
+    const QString &db = state.WorkDBFile;
+    // The stop request stays set once made, so every later step ends at its first progress point.
+    auto report = [&state](Status failure) {
+        return CollectionReport{std::move(failure), state.StopRequested};
+    };
 
     context.user.showStatus(QStringLiteral("סורק את רשימת הפריטים"));
-    FillDBItem7(context, state.WorkDBFile);
-    if (state.CollectFailed)
-        return Status::ok();
+    if (Status items = FillDBItem7(context, db); !items)
+        return report(items);
 
     context.user.showStatus(QStringLiteral("סורק קודי מיון"));
-    FillDBItemSort7(context, state.WorkDBFile);
-    if (state.CollectFailed)
-        return Status::ok();
+    if (Status groups = FillDBItemSort7(context, db); !groups)
+        return report(groups);
 
-    for (const ChosenList &chosen : ChosenLists) {
-        if (!isTicked(settings.*chosen.use))
+    for (const ChosenList &chosen : chosenLists()) {
+        if (!(settings.*chosen.collect))
             continue;
         context.user.showStatus(QString::fromUtf16(chosen.status));
         const std::optional<std::int32_t> number = (settings.*chosen.list).currentItemData();
         if (!number)
             return nothingChosen(QString::fromUtf16(chosen.name));
-        chosen.fill(context, state.WorkDBFile, chosen.digit, *number);
-        if (state.CollectFailed)
-            return Status::ok();
+        const Status filled = chosen.price ? FillDBItemPrice(context, db, chosen.digit, *number)
+                                           : FillDBItemExtraNote(context, db, chosen.digit, *number);
+        if (!filled)
+            return report(filled);
     }
 
     context.user.showStatus(QStringLiteral("סריקת הנתונים הסתיימה"));
-    return Status::ok();
+    return report(Status::ok());
 }
 
 } // namespace zorbin

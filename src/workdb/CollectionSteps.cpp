@@ -38,10 +38,10 @@ CopiedColumn pictureByKey(const CatalogSettings &settings)
 {
     return {QStringLiteral("ItemPic"), QString(),
             [&settings](const QVariant &, const QString &key) {
-                QString folder = settings.txtPicPath;
+                QString folder = settings.pictureFolder;
                 if (!folder.endsWith(pathSeparator()))
                     folder += pathSeparator();
-                return QVariant(folder + key + settings.txtPicExtension);
+                return QVariant(folder + key + settings.pictureExtension);
             },
             true};
 }
@@ -53,13 +53,13 @@ QString TextOrDefault(const QVariant &value, const QString &defaultText)
     return value.isNull() ? defaultText : value.toString();
 }
 
-void FillDBItem7(RunContext &context, const QString &pDBFile)
+Status FillDBItem7(RunContext &context, const QString &pDBFile)
 {
     const CatalogSettings &settings = context.settings;
     Result<QString> statement = buildItemStatement(settings);
     if (!statement)
-        return reportCollectFault(context, statement.status().description());
-    const bool pictureFromKey = settings.OptPicSource.selected() == PictureFromItemKey;
+        return statement.status();
+    const bool pictureFromKey = settings.pictureSource == PictureSource::ItemKey;
     CopyPlan plan{statement.value(),
                   QStringLiteral("tItems"),
                   {keyText(),
@@ -73,40 +73,40 @@ void FillDBItem7(RunContext &context, const QString &pDBFile)
                    asRead("SellPrice", "Price"),
                    textOr("SellCoin", "Currency", MissingText)},
                   true};
-    runCopyLoop(context, pDBFile, plan);
+    return runCopyLoop(context, pDBFile, plan);
 }
 
 namespace {
 
 // The price and note steps: a table of items' keys and their values, named by its digit.
-void fillKeyedTable(RunContext &context, const QString &pDBFile, const Result<QString> &statement,
-                    const QString &table, std::vector<CopiedColumn> values)
+Status fillKeyedTable(RunContext &context, const QString &pDBFile, const Result<QString> &statement,
+                      const QString &table, std::vector<CopiedColumn> values)
 {
     if (!statement)
-        return reportCollectFault(context, statement.status().description());
+        return statement.status();
     values.insert(values.begin(), keyText());
-    runCopyLoop(context, pDBFile, CopyPlan{statement.value(), table, std::move(values), true});
+    return runCopyLoop(context, pDBFile, CopyPlan{statement.value(), table, std::move(values), true});
 }
 
 } // namespace
 
-void FillDBItemPrice(RunContext &context, const QString &pDBFile, std::int16_t pPriceID,
-                     std::int32_t pPriceListID)
+Status FillDBItemPrice(RunContext &context, const QString &pDBFile, std::int16_t pPriceID,
+                       std::int32_t pPriceListID)
 {
-    fillKeyedTable(context, pDBFile, buildPriceStatement(context.settings, pPriceListID),
-                   QStringLiteral("tItemPrice") + QString::number(pPriceID),
-                   {textOr("Coin", "CurrencyCode", Shekel), asRead("Price", "Price")});
+    return fillKeyedTable(context, pDBFile, buildPriceStatement(context.settings, pPriceListID),
+                          QStringLiteral("tItemPrice") + QString::number(pPriceID),
+                          {textOr("Coin", "CurrencyCode", Shekel), asRead("Price", "Price")});
 }
 
-void FillDBItemExtraNote(RunContext &context, const QString &pDBFile, std::int16_t pNoteFieldID,
-                         std::int32_t pExtraNoteID)
+Status FillDBItemExtraNote(RunContext &context, const QString &pDBFile, std::int16_t pNoteFieldID,
+                           std::int32_t pExtraNoteID)
 {
-    fillKeyedTable(context, pDBFile, buildExtraNoteStatement(context.settings, pExtraNoteID),
-                   QStringLiteral("tExtraNote") + QString::number(pNoteFieldID),
-                   {textOr("ExtraNote", "Note", MissingText)});
+    return fillKeyedTable(context, pDBFile, buildExtraNoteStatement(context.settings, pExtraNoteID),
+                          QStringLiteral("tExtraNote") + QString::number(pNoteFieldID),
+                          {textOr("ExtraNote", "Note", MissingText)});
 }
 
-void FillDBItemSort7(RunContext &context, const QString &pDBFile)
+Status FillDBItemSort7(RunContext &context, const QString &pDBFile)
 {
     // A Null or empty name leaves SortName Null.
     const CopiedColumn name{QStringLiteral("SortName"), QStringLiteral("SortCodeName"),
@@ -118,7 +118,7 @@ void FillDBItemSort7(RunContext &context, const QString &pDBFile)
                   QStringLiteral("tItemSort"),
                   {asRead("ItemSort", "ItemSortCode"), name},
                   false};
-    runCopyLoop(context, pDBFile, plan);
+    return runCopyLoop(context, pDBFile, plan);
 }
 
 } // namespace zorbin

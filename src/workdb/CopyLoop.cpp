@@ -1,10 +1,10 @@
 #include "workdb/CopyLoop.h"
 
+#include "model/ConnectionParams.h"
 #include "model/ProgressMeter.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "model/UserPort.h"
-#include "model/ConnectionParams.h"
 #include "source/ConnectionString.h"
 #include "workdb/RowWriter.h"
 #include "workdb/SourceReadAhead.h"
@@ -89,28 +89,20 @@ QStringList targetColumns(const CopyPlan &plan)
 
 } // namespace
 
-void reportCollectFault(RunContext &context, const QString &description)
-{
-    context.user.tell(description, FaultTitle, MessageIcon::Information);
-    context.state.CollectFailed = true;
-}
-
-void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan)
+Status runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan)
 {
     const SourceColumns columns = sourceColumns(plan);
     // Encoding the texts is the costly part of shaping a row. A database file is read faster
     // than the working database is written, so the reading thread has time for it; an ODBC
     // driver reads slower, and there the step's thread encodes while it writes.
-    const bool encodeWhileReading = context.connection.type == FileConnection;
+    const bool encodeWhileReading = context.connection.kind == ConnectionKind::File;
     const SourceReadAhead::Shaper shaper = shaperFor(plan, columns, encodeWhileReading);
     SourceReadAhead source(BuildConnString(context.connection), plan.statement, columns.names, plan.itemLoop,
                            plan.columns.size(), shaper);
     if (Status running = source.waitUntilRunning(); !running)
-        return reportCollectFault(context, running.description());
+        return running;
     if (!source.next()) {
-        if (Status read = source.readFailure(); !read)
-            reportCollectFault(context, read.description());
-        return; // no rows: the working database is not opened
+        return source.readFailure(); // no rows: the working database is not opened
     }
 
     ProgressMeter meter(context.user, context.state);
@@ -119,14 +111,14 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
         meter.reset();
     Result<std::unique_ptr<WorkDatabase>> work = WorkDatabase::open(pDBFile);
     if (!work)
-        return reportCollectFault(context, work.status().description());
+        return work.status();
     WorkDatabase &target = *work.value();
     // One transaction for the step, committed however the step ends: what was written stays.
     if (Status begun = target.begin(); !begun)
-        return reportCollectFault(context, begun.description());
+        return begun;
     RowWriter writer(target, plan.table, targetColumns(plan));
     if (!writer.prepareError().isEmpty())
-        return reportCollectFault(context, writer.prepareError());
+        return Status::fault(writer.prepareError());
 
     const bool readsSettings = std::any_of(plan.columns.begin(), plan.columns.end(),
                                            [](const CopiedColumn &c) { return c.readsSettings; });
@@ -158,7 +150,7 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
             continue;
         if (Status written = writePending(); !written) {
             (void)target.commit();
-            return reportCollectFault(context, written.description());
+            return written;
         }
         if (plan.itemLoop && meter.tick(counter, total)) {
             stopped = true;
@@ -167,15 +159,16 @@ void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &pl
     } while (source.next());
     if (Status written = writePending(); !written) {
         (void)target.commit();
-        return reportCollectFault(context, written.description());
+        return written;
     }
 
     if (Status committed = target.commit(); !committed)
-        return reportCollectFault(context, committed.description());
+        return committed;
     if (Status read = source.readFailure(); !stopped && !read)
-        return reportCollectFault(context, read.description());
+        return read;
     if (plan.itemLoop)
         meter.reset();
+    return Status::ok();
 }
 
 } // namespace zorbin

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "common/Status.h"
+
 #include <QString>
 #include <QVariant>
 #include <functional>
@@ -40,14 +42,11 @@ struct CopyPlan
 // stored connection parameters, runs the statement, and when it yields rows opens the working
 // database at `pDBFile` and adds them. A row the table already holds by its key is dropped
 // without a word; the first of several rows with one key stays. Any other failure (connection,
-// statement, a value the table refuses, the working database) is shown once, with the
-// information icon and the title "תקלה", sets CollectFailed, and ends the step with the bar
-// where it was. A stop request ends it at a progress point without setting CollectFailed.
-// Whatever was written before a stop or a failure stays: rows are written in one transaction
-// that is committed before the step returns, whichever way it returns.
-void runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan);
-
-// Shows a failure of a collection step and sets CollectFailed.
-void reportCollectFault(RunContext &context, const QString &description);
+// statement, a value the table refuses, the working database, a read that fails after the
+// last row) ends the step with the bar where it was and is returned. A stop request ends it at
+// a progress point, successfully. Whatever was written before a stop or a failure stays: rows
+// are written in one transaction that is committed before the step returns, whichever way it
+// returns.
+Status runCopyLoop(RunContext &context, const QString &pDBFile, const CopyPlan &plan);
 
 } // namespace zorbin

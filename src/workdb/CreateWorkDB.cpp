@@ -1,5 +1,4 @@
 #include "model/RunContext.h"
-#include "model/UserPort.h"
 #include "platform/FileSystem.h"
 #include "workdb/WorkDatabase.h"
 #include "workdb/WorkDatabasePath.h"
@@ -38,13 +37,11 @@ Status createWorkDatabase(FileSystem &files, const QString &path)
     return work.value()->commit();
 }
 
-QString CreateWorkDB(RunContext &context)
+Result<QString> CreateWorkDB(RunContext &context)
 {
     const QString path = workDatabasePath();
-    if (Status created = createWorkDatabase(context.files, path); !created) {
-        context.user.tell(created.description(), FaultTitle, MessageIcon::Critical);
-        return {};
-    }
+    if (Status created = createWorkDatabase(context.files, path); !created)
+        return created;
     return path;
 }
 

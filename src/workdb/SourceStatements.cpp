@@ -7,10 +7,10 @@ namespace zorbin {
 
 Result<QString> buildItemStatement(const CatalogSettings &settings)
 {
-    const int pictureSource = settings.OptPicSource.selected();
+    const PictureSource pictureSource = settings.pictureSource.value_or(PictureSource::FileField);
     std::int32_t noteNumber = 0;
-    if (pictureSource == PictureFromExtraNote) {
-        const std::optional<std::int32_t> chosen = settings.cmbPicExtraNote.currentItemData();
+    if (pictureSource == PictureSource::ExtraNote) {
+        const std::optional<std::int32_t> chosen = settings.pictureNote.currentItemData();
         if (!chosen)
             return Status::fault(QStringLiteral("התמונות נלקחות מתוך נתון נוסף, אך לא נבחר איזה נתון נוסף. "
                                                 "יש לבחור אותו בלשונית \"הגדרות נתונים\"."));
@@ -22,17 +22,17 @@ Result<QString> buildItemStatement(const CatalogSettings &settings)
 
     QString sql = QStringLiteral("SELECT Items.ItemKey, Items.SortGroup, Items.Filter, Items.SalesUnit");
     sql += QStringLiteral(", Items.Price, Items.Currency");
-    sql += settings.CmbItemNameType.currentIndex() == 1 ? QStringLiteral(", Items.ForignName As ItemDesc")
+    sql += settings.itemName == ItemNameSource::Foreign ? QStringLiteral(", Items.ForignName As ItemDesc")
                                                         : QStringLiteral(", Items.ItemName As ItemDesc");
-    if (pictureSource == PictureFromFileField)
+    if (pictureSource == PictureSource::FileField)
         sql += QStringLiteral(", Items.ExFile As PicFile");
-    else if (pictureSource == PictureFromExtraNote)
+    else if (pictureSource == PictureSource::ExtraNote)
         sql += QStringLiteral(", ExtraNotes.Note As PicFile");
     sql += QStringLiteral(" FROM Items");
-    if (pictureSource == PictureFromExtraNote)
+    if (pictureSource == PictureSource::ExtraNote)
         sql += QStringLiteral(", ExtraNotes");
     sql += QStringLiteral(" WHERE Not (ItemKey Is Null)");
-    if (pictureSource == PictureFromExtraNote) {
+    if (pictureSource == PictureSource::ExtraNote) {
         sql += QStringLiteral(" And ExtraNotes.ItemFlag = 1");
         sql += QStringLiteral(" And ExtraNotes.KeF = Items.ItemKey");
         sql += QStringLiteral(" And ExtraNotes.NoteID = ") + QString::number(noteNumber);

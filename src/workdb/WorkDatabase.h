@@ -17,11 +17,9 @@ struct RunContext;
 
 // Creates the working database at workDatabasePath(): deletes the file of the previous run
 // (and a journal it may have left), then creates the six tables of workTables(), each with
-// its primary key and no other index, and closes the file. Returns the path. On failure the
-// fault box (critical icon, "תקלה") shows the description through context.user, and the
-// empty text is returned; whatever was made before the failure stays for the next call to
-// delete.
-QString CreateWorkDB(RunContext &context);
+// its primary key and no other index, and closes the file. Returns the path, or the failure;
+// whatever was made before a failure stays for the next call to delete.
+Result<QString> CreateWorkDB(RunContext &context);
 // The same at a given path, without a message: the failure's description.
 Status createWorkDatabase(FileSystem &files, const QString &path);
 

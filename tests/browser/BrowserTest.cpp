@@ -2,11 +2,11 @@
 // through inspect-catalog.html and reports what it shows.
 #include "HeadlessChromium.h"
 #include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "output/CatalogPages.h"
 #include "platform/FileSystem.h"
-#include "model/ConnectionParams.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
@@ -170,15 +170,15 @@ private Q_SLOTS:
         QVERIFY2(made.isOk(), qPrintable(made.description()));
 
         CatalogSettings settings;
-        settings.txtRows = QStringLiteral("1");
-        settings.txtCols = QStringLiteral("3");
-        settings.txtImageW = QStringLiteral("50");
-        settings.txtImageH = QStringLiteral("50");
-        settings.lines[0].tag = QStringLiteral("0");
-        settings.lines[1].tag = QStringLiteral("2");
-        QVERIFY(settings.cmbPageSplit.setCurrentIndex(0));
-        QVERIFY(settings.CmbSortBy.setCurrentIndex(0));
-        QVERIFY(settings.CmbSortDir.setCurrentIndex(0));
+        settings.rows = 1;
+        settings.columns = 3;
+        settings.pictureWidth = 50;
+        settings.pictureHeight = 50;
+        settings.lines[0].field = 0;
+        settings.lines[1].field = 2;
+        settings.pageSplit = PageSplit::OneFile;
+        settings.sortKey = SortKey::ItemKey;
+        settings.sortDirection = SortDirection::Ascending;
         ConnectionParams connection;
         RunState state;
         test::RecordingUserPort user;

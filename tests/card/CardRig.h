@@ -2,6 +2,9 @@
 
 #include "card/FileChooser.h"
 #include "card/MainCard.h"
+#include "card/WidgetUserPort.h"
+#include "control/Program.h"
+#include "platform/FileSystem.h"
 #include "testutil/MemorySettingsStore.h"
 #include "testutil/RecordingStages.h"
 
@@ -89,23 +92,45 @@ public:
     QStringList folderStarts;
 };
 
-// A settings card over an in-memory store and recording stages. `fillLists` runs inside the
-// start-up's list filling, as the accounting database would fill the lists.
+// The desktop program's parts over an in-memory store and recording stages, as the program
+// assembles them: the port, the control, and then the window that shows them.
+struct RecordingProgram
+{
+    RecordingProgram()
+    {
+        auto made = std::make_unique<RecordingStages>();
+        stages = made.get();
+        control = std::make_unique<CatalogControl>(user, store, localFileSystem(), std::move(made));
+    }
+
+    MemorySettingsStore store;
+    WidgetUserPort user;
+    RecordingStages *stages = nullptr;
+    std::unique_ptr<CatalogControl> control;
+};
+
+// The desktop program's parts as the program itself assembles them, over a given store.
+struct AssembledProgram
+{
+    explicit AssembledProgram(SettingsStore &store) : control(assembleControl(user, store)) {}
+
+    WidgetUserPort user;
+    std::unique_ptr<CatalogControl> control;
+};
+
+// A settings card over a recording program. `fillLists` runs inside the start-up's list
+// filling, as the accounting database would fill the lists.
 struct CardRig
 {
     void start()
     {
-        card = std::make_unique<MainCard>(store, [this](RunContext &context, SettingsStore &) {
-            auto made = std::make_unique<RecordingStages>(context);
-            stages = made.get();
-            made->during = [this, &context](const QString &stage) {
-                if (stage == QLatin1String("FillCmbPriceField") && fillLists)
-                    fillLists(context.settings);
-                if (during)
-                    during(stage);
-            };
-            return made;
-        });
+        stages->during = [this](const QString &stage) {
+            if (stage == QLatin1String("FillCmbPriceField") && fillLists)
+                fillLists(program.control->settings());
+            if (during)
+                during(stage);
+        };
+        card = std::make_unique<MainCard>(*program.control, program.user);
         card->setFileChooser(files);
         card->resize(900, 700);
     }
@@ -118,9 +143,10 @@ struct CardRig
         return widget;
     }
 
-    MemorySettingsStore store;
+    RecordingProgram program;
+    MemorySettingsStore &store = program.store;
+    RecordingStages *&stages = program.stages;
     FakeFileChooser files;
-    RecordingStages *stages = nullptr;
     std::function<void(CatalogSettings &)> fillLists;
     std::function<void(const QString &stage)> during;
     std::unique_ptr<MainCard> card;
@@ -137,11 +163,11 @@ inline void typeText(QWidget *widget, const QString &text)
 // Lists as a reachable accounting database fills them: three price lists, two note kinds.
 inline void fillDemoLists(CatalogSettings &settings)
 {
-    for (ChoiceList *notes : {&settings.cmbExtraNote1, &settings.cmbExtraNote2, &settings.cmbPicExtraNote}) {
+    for (ChoiceList *notes : {&settings.extraNote1, &settings.extraNote2, &settings.pictureNote}) {
         notes->addEntry(QStringLiteral("צבע"), 1);
         notes->addEntry(QStringLiteral("תמונה"), 2);
     }
-    for (ChoiceList *prices : {&settings.cmbPriceField, &settings.cmbPriceField2}) {
+    for (ChoiceList *prices : {&settings.priceList1, &settings.priceList2}) {
         prices->addEntry(QStringLiteral("מחיר הפריט"), 0);
         prices->addEntry(QStringLiteral("סיטונאי"), 3);
         prices->addEntry(QStringLiteral("קמעונאי"), 4);

@@ -1,5 +1,6 @@
 #include "card/CardWindow.h"
 
+#include "CardRig.h"
 #include "card/MainCard.h"
 #include "model/ProgressMeter.h"
 #include "model/UserPort.h"
@@ -23,14 +24,10 @@ private Q_SLOTS:
     {
         QTemporaryDir output;
         qputenv("ZORBIN_BROWSER", "true");
-        MemorySettingsStore store;
-        RecordingStages *stages = nullptr;
-        CardWindow window(store, [&stages](RunContext &context, SettingsStore &) {
-            auto made = std::make_unique<RecordingStages>(context);
-            stages = made.get();
-            return made;
-        });
-        window.card()->control().settings().txtPagingPath = output.path();
+        RecordingProgram program;
+        RecordingStages *stages = program.stages;
+        CardWindow window(*program.control, program.user);
+        window.card()->control().settings().outputFolder = output.path();
         window.show();
         QVERIFY(QTest::qWaitForWindowExposed(&window));
 
@@ -47,7 +44,7 @@ private Q_SLOTS:
                     break;
             }
         };
-        QVERIFY(window.card()->control().produceCatalog().ending != RunOutcome::Ending::Declined);
+        QVERIFY(window.card()->control().makeCatalog().ending != RunOutcome::Ending::Declined);
         QVERIFY(!closedAtOnce);
         QCOMPARE(rows, 5);                                              // the close pressed stop
         QVERIFY(stages->names().contains(QStringLiteral("CreateCSS"))); // the run ended in order
@@ -56,10 +53,8 @@ private Q_SLOTS:
 
     void closingWhileIdleCloses()
     {
-        MemorySettingsStore store;
-        CardWindow window(store, [](RunContext &context, SettingsStore &) {
-            return std::make_unique<RecordingStages>(context);
-        });
+        RecordingProgram program;
+        CardWindow window(*program.control, program.user);
         window.show();
         QVERIFY(window.close());
         QVERIFY(!window.isVisible());

@@ -60,7 +60,8 @@ private Q_SLOTS:
     {
         QTemporaryDir folder;
         const auto store = copyDemoSettings(folder.path());
-        MainCard card(*store);
+        AssembledProgram program(*store);
+        MainCard card(*program.control, program.user);
         auto *prices = card.findChild<QComboBox *>(QStringLiteral("cmbPriceField"));
         auto *notes = card.findChild<QComboBox *>(QStringLiteral("cmbExtraNote1"));
         auto *pictureNote = card.findChild<QComboBox *>(QStringLiteral("cmbPicExtraNote"));
@@ -76,7 +77,7 @@ private Q_SLOTS:
         QCOMPARE(notes->currentIndex(), 1);
         QCOMPARE(pictureNote->currentIndex(), 2);
         CatalogSettings &settings = card.control().settings();
-        QCOMPARE(prices->currentText(), settings.cmbPriceField.entry(1).text);
+        QCOMPARE(prices->currentText(), settings.priceList1.entry(1).text);
         QVERIFY(card.control().persistence().unappliedKeys().isEmpty());
         QCOMPARE(card.findChild<QLineEdit *>(QStringLiteral("txtTopTitle"))->text(),
                  QStringLiteral("קטלוג לדוגמה"));
@@ -89,7 +90,8 @@ private Q_SLOTS:
         const auto store = copyDemoSettings(folder.path());
         const QString output = QDir(folder.path()).filePath(QStringLiteral("catalog"));
         setStored(*store, QStringLiteral("PagingPath"), output);
-        MainCard card(*store);
+        AssembledProgram program(*store);
+        MainCard card(*program.control, program.user);
         ModalAnswerer answerer;
         answerer.buttons = {QMessageBox::No, QMessageBox::Yes};
         int opening = 0;
@@ -170,7 +172,8 @@ private Q_SLOTS:
         const auto store = openIniSettingsStore(QDir(large).filePath(QStringLiteral("demo-settings.ini")));
         const QString output = QDir(folder.path()).filePath(QStringLiteral("catalog"));
         setStored(*store, QStringLiteral("PagingPath"), output);
-        MainCard card(*store);
+        AssembledProgram program(*store);
+        MainCard card(*program.control, program.user);
         auto *stop = card.findChild<QPushButton *>(QStringLiteral("cmdStop"));
         // The user presses stop as soon as the run is under way; the click reaches the control
         // when the collection yields at its first progress point.

@@ -1,10 +1,10 @@
+#include "card/CellLineEditor.h"
 #include "card/tabs/PageSetupTab.h"
 #include "card/tabs/RangeTab.h"
-#include "model/ProgressMeter.h"
-#include "model/UserPort.h"
-#include "card/CellLineEditor.h"
 #include "dialogs/ItemListModel.h"
 #include "dialogs/SelectItemDialog.h"
+#include "model/ProgressMeter.h"
+#include "model/UserPort.h"
 #include "tests/card/CardRig.h"
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
@@ -89,7 +89,7 @@ private Q_SLOTS:
                     ->text()
                     .startsWith(QStringLiteral("טלפון: ")));
         QCOMPARE(rig.find<QLineEdit>(QStringLiteral("txtPagingPath"))->text(),
-                 rig.card->control().settings().txtPagingPath);
+                 rig.card->control().settings().outputFolder);
         for (const QString &name : {QStringLiteral("CmbSortBy"), QStringLiteral("CmbSortDir"),
                                     QStringLiteral("CmbItemNameType"), QStringLiteral("cmbPriceField"),
                                     QStringLiteral("cmbPriceField2"), QStringLiteral("cmbExtraNote1"),
@@ -236,22 +236,22 @@ private Q_SLOTS:
         auto *prices = rig.find<QComboBox>(QStringLiteral("cmbPriceField"));
         QCOMPARE(prices->count(), 3);
         QCOMPARE(prices->currentIndex(), -1);
-        QCOMPARE(settings.cmbPriceField.currentIndex(), -1);
+        QCOMPARE(settings.priceList1.currentIndex(), -1);
         QCOMPARE(rig.find<QComboBox>(QStringLiteral("CmbSortBy"))->currentIndex(), -1);
 
         // Entries arriving later (a list filled again) leave "no entry" as it is.
-        settings.cmbPriceField.addEntry(QStringLiteral("מבצע"), 9);
+        settings.priceList1.addEntry(QStringLiteral("מבצע"), 9);
         QCOMPARE(prices->currentIndex(), -1);
-        QCOMPARE(settings.cmbPriceField.currentIndex(), -1);
-        settings.cmbPriceField.clear();
-        settings.cmbPriceField.addEntry(QStringLiteral("מבצע"), 9);
+        QCOMPARE(settings.priceList1.currentIndex(), -1);
+        settings.priceList1.clear();
+        settings.priceList1.addEntry(QStringLiteral("מבצע"), 9);
         QCOMPARE(prices->currentIndex(), -1);
-        QCOMPARE(settings.cmbPriceField.currentIndex(), -1);
+        QCOMPARE(settings.priceList1.currentIndex(), -1);
 
         // A choice in the box is the list's selection, and the other way round.
         prices->setCurrentIndex(0);
-        QCOMPARE(settings.cmbPriceField.currentIndex(), 0);
-        settings.cmbPriceField.setCurrentIndex(-1);
+        QCOMPARE(settings.priceList1.currentIndex(), 0);
+        settings.priceList1.setCurrentIndex(-1);
         QCOMPARE(prices->currentIndex(), -1);
         rig.find<QPushButton>(QStringLiteral("CmdDef"))->click();
         QCOMPARE(rig.store.get(QStringLiteral("PriceField")), QStringLiteral("-1"));
@@ -264,7 +264,7 @@ private Q_SLOTS:
         qputenv("ZORBIN_BROWSER", "true");
         CardRig rig;
         rig.start();
-        rig.card->control().settings().txtPagingPath = output.path();
+        rig.card->control().settings().outputFolder = output.path();
         auto *run = rig.find<QPushButton>(QStringLiteral("cmdRunMailing"));
         auto *list = rig.find<QPushButton>(QStringLiteral("CmdPreview"));
         auto *save = rig.find<QPushButton>(QStringLiteral("CmdDef"));
@@ -364,7 +364,7 @@ private Q_SLOTS:
         rig.files.answer = QStringLiteral("/pictures/חנות/logo.GIF");
         chooser->click();
         QCOMPARE(logo->text(), QStringLiteral("/pictures/חנות/logo.GIF"));
-        QCOMPARE(rig.card->control().settings().txtLogo, QStringLiteral("/pictures/חנות/logo.GIF"));
+        QCOMPARE(rig.card->control().settings().logo, QStringLiteral("/pictures/חנות/logo.GIF"));
         chooser->click();
         QCOMPARE(rig.files.fileRequests.last().startPath, QStringLiteral("/pictures/חנות/logo.GIF"));
     }
@@ -376,13 +376,13 @@ private Q_SLOTS:
         rig.files.answer = QStringLiteral("/srv/pictures");
         rig.find<QAbstractButton>(QStringLiteral("cmdPicPath"))->click();
         // Picture names are joined straight onto the folder: it keeps its separator.
-        QCOMPARE(rig.card->control().settings().txtPicPath, QStringLiteral("/srv/pictures/"));
+        QCOMPARE(rig.card->control().settings().pictureFolder, QStringLiteral("/srv/pictures/"));
         rig.files.answer = QStringLiteral("/srv/catalog");
         rig.find<QAbstractButton>(QStringLiteral("cmdPagingPath"))->click();
-        QCOMPARE(rig.card->control().settings().txtPagingPath, QStringLiteral("/srv/catalog"));
+        QCOMPARE(rig.card->control().settings().outputFolder, QStringLiteral("/srv/catalog"));
         rig.files.answer = std::nullopt;
         rig.find<QAbstractButton>(QStringLiteral("cmdPagingPath"))->click();
-        QCOMPARE(rig.card->control().settings().txtPagingPath, QStringLiteral("/srv/catalog"));
+        QCOMPARE(rig.card->control().settings().outputFolder, QStringLiteral("/srv/catalog"));
     }
 
     void selectingItemsCollectsFirstThenAsks()

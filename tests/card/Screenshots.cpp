@@ -5,6 +5,8 @@
 // selection dialog writes the working database into the temporary folder (TMPDIR), as every run does.
 #include "card/CardWindow.h"
 #include "card/MainCard.h"
+#include "card/WidgetUserPort.h"
+#include "control/Program.h"
 #include "dialogs/ItemListModel.h"
 #include "dialogs/LogonDialog.h"
 #include "dialogs/SelectItemDialog.h"
@@ -56,7 +58,9 @@ int main(int argc, char *argv[])
                                      ? QString::fromLocal8Bit(argv[2])
                                      : QDir(test::demoFolder()).filePath(QStringLiteral("demo-settings.ini"));
     const auto store = openIniSettingsStore(demoSettings);
-    CardWindow window(*store);
+    WidgetUserPort user;
+    const auto control = assembleControl(user, *store);
+    CardWindow window(*control, user);
     window.resize(window.sizeHint().expandedTo(QSize(860, 640)));
     window.show();
     if (!QTest::qWaitForWindowExposed(&window))
@@ -73,8 +77,7 @@ int main(int argc, char *argv[])
     }
 
     {
-        CatalogControl &control = window.card()->control();
-        frmLogon connection(control.store(), control.connection(), &window);
+        frmLogon connection(control->store(), control->connection(), &window);
         connection.resize(
             connection.sizeHint().expandedTo(QSize(520, 0))); // as the connection button opens it
         connection.show();
@@ -82,10 +85,10 @@ int main(int argc, char *argv[])
     }
     {
         // The item selection dialog as a user leaves it: the items collected, a few unmarked.
-        CatalogControl &control = window.card()->control();
-        if (const Status collected = control.collect(); !collected)
-            std::fprintf(stderr, "collecting the demo items: %s\n", qPrintable(collected.description()));
-        frmSelectItem selection(control.runState().WorkDBFile, &window);
+        if (const RunOutcome collected = control->collectItems();
+            collected.ending != RunOutcome::Ending::Complete)
+            std::fprintf(stderr, "collecting the demo items: %s\n", qPrintable(collected.message));
+        frmSelectItem selection(control->runState().WorkDBFile, &window);
         ItemListModel *items = selection.model();
         for (int row = 1; row < items->rowCount() && row <= 5; row += 2)
             items->setData(items->index(row, ItemListModel::IncludeColumn), Qt::Unchecked,

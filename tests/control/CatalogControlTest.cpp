@@ -23,15 +23,12 @@ struct Rig
 {
     Rig()
     {
-        control = std::make_unique<CatalogControl>(user, store, files,
-                                                   [this](RunContext &context, SettingsStore &) {
-                                                       auto made = std::make_unique<RecordingStages>(context);
-                                                       stages = made.get();
-                                                       return made;
-                                                   });
+        auto made = std::make_unique<RecordingStages>();
+        stages = made.get();
+        control = std::make_unique<CatalogControl>(user, store, files, std::move(made));
         output = QDir(folder.path()).filePath(QStringLiteral("catalog"));
-        control->settings().txtPagingPath = output;
-        control->settings().cmbPageSplit.setCurrentIndex(1);
+        control->settings().outputFolder = output;
+        control->settings().pageSplit = PageSplit::FilePerPage;
         stages->firstPage = out(QStringLiteral("zoindex.htm"));
     }
 
@@ -60,16 +57,16 @@ private Q_SLOTS:
         rig.store.set(QStringLiteral("PriceField"), QStringLiteral("1"));
         rig.stages->during = [&rig](const QString &stage) {
             if (stage == QLatin1String("FillCmbPriceField")) {
-                rig.control->settings().cmbPriceField.addEntry(QStringLiteral("מחיר מכירה"), 0);
-                rig.control->settings().cmbPriceField.addEntry(QStringLiteral("סיטונאי"), 3);
+                rig.control->settings().priceList1.addEntry(QStringLiteral("מחיר מכירה"), 0);
+                rig.control->settings().priceList1.addEntry(QStringLiteral("סיטונאי"), 3);
             }
         };
         rig.control->runState().WorkDBFile = QStringLiteral("left over");
-        rig.control->UserControl_Initialize();
+        rig.control->startUp();
         QCOMPARE(rig.stages->names(),
                  (QStringList{QStringLiteral("GetRegConnParams"), QStringLiteral("FillCmbExtraNote"),
                               QStringLiteral("FillCmbPriceField")}));
-        QCOMPARE(rig.control->settings().cmbPriceField.currentIndex(), 1);
+        QCOMPARE(rig.control->settings().priceList1.currentIndex(), 1);
         QCOMPARE(rig.control->runState().WorkDBFile, QString());
         QVERIFY(rig.user.messages.isEmpty());
     }
@@ -77,7 +74,7 @@ private Q_SLOTS:
     void catalogRunCallsItsStagesInOrder()
     {
         Rig rig;
-        rig.control->cmdRunMailing_Click();
+        rig.control->askAndMakeCatalog();
 
         QCOMPARE(rig.user.questions, QStringList{QStringLiteral("להתחיל בהכנת הקטלוג?")});
         QCOMPARE(rig.user.questionTitles, QStringList{QStringLiteral("שאלה חשובה")});
@@ -99,8 +96,8 @@ private Q_SLOTS:
     void oneFileModeCopiesNoPictures()
     {
         Rig rig;
-        rig.control->settings().cmbPageSplit.setCurrentIndex(0);
-        rig.control->cmdRunMailing_Click();
+        rig.control->settings().pageSplit = PageSplit::OneFile;
+        rig.control->askAndMakeCatalog();
         QVERIFY(!rig.stages->names().contains(QStringLiteral("CollectCatImages")));
         QVERIFY(QFileInfo(rig.images()).isDir());
     }
@@ -108,9 +105,9 @@ private Q_SLOTS:
     void handPickedItemsAreNotCollectedAgain()
     {
         Rig rig;
-        rig.control->settings().ChkSelectAccount = CheckValue::Checked;
+        rig.control->settings().useMarkedItems = true;
         rig.control->runState().WorkDBFile = QStringLiteral("/tmp/marked.tmp");
-        rig.control->cmdRunMailing_Click();
+        rig.control->askAndMakeCatalog();
         QVERIFY(!rig.stages->names().contains(QStringLiteral("BuildAndCollectData")));
         QVERIFY(rig.stages->calls.contains(QStringLiteral("CreateCatHTML(%1,/tmp/marked.tmp,%2)")
                                                .arg(rig.out(QStringLiteral("zo")), rig.images())));
@@ -119,9 +116,9 @@ private Q_SLOTS:
     void handPickedWithoutCollectionSaysWhatToDo()
     {
         Rig rig;
-        rig.control->settings().ChkSelectAccount = CheckValue::Checked;
+        rig.control->settings().useMarkedItems = true;
         writeFile(QDir(rig.folder.path()).filePath(QStringLiteral("keep.htm")));
-        const RunOutcome outcome = rig.control->cmdRunMailing_Click();
+        const RunOutcome outcome = rig.control->askAndMakeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
         QCOMPARE(rig.user.messages.size(), 1);
         QCOMPARE(rig.user.messages.constFirst().title, QStringLiteral("תקלה"));
@@ -135,10 +132,10 @@ private Q_SLOTS:
         Rig rig;
         rig.control->runState().StopRequested = true;
         rig.user.answers = {Answer::No};
-        QCOMPARE(rig.control->cmdRunMailing_Click().ending, RunOutcome::Ending::Declined);
-        rig.control->settings().ChkSelectAccount = CheckValue::Checked;
+        QCOMPARE(rig.control->askAndMakeCatalog().ending, RunOutcome::Ending::Declined);
+        rig.control->settings().useMarkedItems = true;
         rig.user.answers = {Answer::Cancel};
-        QCOMPARE(rig.control->CmdPreview_Click().ending, RunOutcome::Ending::Declined);
+        QCOMPARE(rig.control->askAndMakeList().ending, RunOutcome::Ending::Declined);
 
         QVERIFY(rig.stages->calls.isEmpty());
         QVERIFY(rig.control->runState().StopRequested);
@@ -149,7 +146,7 @@ private Q_SLOTS:
     void listRunAsksOnlyAboutHandPickedItems()
     {
         Rig rig;
-        rig.control->CmdPreview_Click();
+        rig.control->askAndMakeList();
         QVERIFY(rig.user.questions.isEmpty());
         QCOMPARE(rig.stages->calls,
                  (QStringList{QStringLiteral("BuildAndCollectData()"),
@@ -158,9 +155,9 @@ private Q_SLOTS:
         QCOMPARE(rig.user.browsed, QStringList{rig.out(QStringLiteral("zorbin3.htm"))});
 
         rig.stages->calls.clear();
-        rig.control->settings().ChkSelectAccount = CheckValue::Checked;
+        rig.control->settings().useMarkedItems = true;
         rig.user.answers = {Answer::No};
-        rig.control->CmdPreview_Click();
+        rig.control->askAndMakeList();
         QCOMPARE(rig.user.questions, QStringList{QStringLiteral("לסרוק מחדש את הפריטים?")});
         QCOMPARE(rig.user.questionTitles, QStringList{QStringLiteral("שים לב")});
         QCOMPARE(rig.user.questionButtons.constFirst(), QuestionButtons::YesNoCancel);
@@ -168,7 +165,7 @@ private Q_SLOTS:
 
         rig.stages->calls.clear();
         rig.user.answers = {Answer::Yes};
-        rig.control->CmdPreview_Click();
+        rig.control->askAndMakeList();
         QCOMPARE(rig.stages->names(),
                  (QStringList{QStringLiteral("BuildAndCollectData"), QStringLiteral("CreateListHTML")}));
     }
@@ -176,8 +173,8 @@ private Q_SLOTS:
     void outputFolderIsCreatedOneLevelDeep()
     {
         Rig rig;
-        rig.control->settings().txtPagingPath = rig.out(QStringLiteral("a/b"));
-        const RunOutcome outcome = rig.control->produceCatalog();
+        rig.control->settings().outputFolder = rig.out(QStringLiteral("a/b"));
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
         QCOMPARE(rig.user.messages.size(), 1);
         QCOMPARE(rig.user.messages.constFirst().icon, MessageIcon::Critical);
@@ -185,8 +182,8 @@ private Q_SLOTS:
         QCOMPARE(rig.stages->names(), QStringList{QStringLiteral("BuildAndCollectData")});
         QVERIFY(!QFileInfo::exists(rig.out()));
 
-        rig.control->settings().txtPagingPath = rig.output + QLatin1Char('/');
-        QCOMPARE(rig.control->produceCatalog().ending, RunOutcome::Ending::Shown);
+        rig.control->settings().outputFolder = rig.output + QLatin1Char('/');
+        QCOMPARE(rig.control->makeCatalog().ending, RunOutcome::Ending::Complete);
         QVERIFY(QFileInfo(rig.out()).isDir());
     }
 
@@ -195,9 +192,9 @@ private Q_SLOTS:
         Rig rig;
         const QByteArray saved = qgetenv("TMPDIR");
         qputenv("TMPDIR", rig.folder.path().toUtf8());
-        rig.control->settings().txtPagingPath.clear();
+        rig.control->settings().outputFolder.clear();
         rig.stages->firstPage = QStringLiteral("page");
-        rig.control->produceCatalog();
+        rig.control->makeCatalog();
         qputenv("TMPDIR", saved);
         QVERIFY(rig.stages->calls.contains(QStringLiteral("CreateCSS(%1/,true)").arg(rig.folder.path())));
     }
@@ -222,7 +219,7 @@ private Q_SLOTS:
             QVERIFY(record.add(QStringLiteral("../notes.txt"))); // a damaged record stays in its folder
         }
 
-        rig.control->produceCatalog();
+        rig.control->makeCatalog();
         for (const QString &name : ours)
             QVERIFY2(!QFileInfo::exists(rig.out(name)), qPrintable(name));
         for (const QString &name : theirs)
@@ -246,7 +243,7 @@ private Q_SLOTS:
             QVERIFY(record.add(QStringLiteral("A1.JPG")));
         }
 
-        QCOMPARE(rig.control->produceCatalog().ending, RunOutcome::Ending::Shown);
+        QCOMPARE(rig.control->makeCatalog().ending, RunOutcome::Ending::Complete);
         QVERIFY(QFileInfo(rig.images() + QStringLiteral("/mine")).isDir());
         QVERIFY(!QFileInfo::exists(rig.images() + QStringLiteral("/A1.JPG")));
         QVERIFY(!QFileInfo::exists(CopiedPictures::recordPath(rig.images())));
@@ -258,9 +255,9 @@ private Q_SLOTS:
         QDir().mkpath(rig.output);
         writeFile(rig.out(QStringLiteral("zo000002.htm")));
         rig.files.failingPaths.insert(rig.out(QStringLiteral("zo000002.htm")));
-        const RunOutcome outcome = rig.control->produceCatalog();
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
-        QVERIFY(outcome.description.contains(QStringLiteral("zo000002.htm")));
+        QVERIFY(outcome.message.contains(QStringLiteral("zo000002.htm")));
         QCOMPARE(rig.user.messages.constFirst().title, QStringLiteral("תקלה"));
         QCOMPARE(rig.stages->names(), QStringList{QStringLiteral("BuildAndCollectData")});
         QVERIFY(rig.user.browsed.isEmpty());
@@ -270,7 +267,7 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.stages->collectResult = Status::fault(QStringLiteral("Invalid list index"));
-        const RunOutcome outcome = rig.control->produceCatalog();
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
         QCOMPARE(rig.user.messages.size(), 1);
         QCOMPARE(rig.user.messages.constFirst().text, QStringLiteral("Invalid list index"));
@@ -279,14 +276,18 @@ private Q_SLOTS:
         QVERIFY(!QFileInfo::exists(rig.out()));
     }
 
+    // A failed step is told, with the information icon, and the catalog is still written from
+    // what was collected before it; the outcome says it is partial.
     void failedCollectionStepStillLeadsToOutput()
     {
         Rig rig;
-        rig.stages->during = [&rig](const QString &stage) {
-            if (stage == QLatin1String("BuildAndCollectData"))
-                rig.control->runState().CollectFailed = true;
-        };
-        QCOMPARE(rig.control->produceCatalog().ending, RunOutcome::Ending::Shown);
+        rig.stages->stepFailure = Status::fault(QStringLiteral("פריט K6: הטקסט ארוך מדי"));
+        const RunOutcome outcome = rig.control->makeCatalog();
+        QCOMPARE(outcome.ending, RunOutcome::Ending::Partial);
+        QCOMPARE(outcome.message, QStringLiteral("פריט K6: הטקסט ארוך מדי"));
+        QCOMPARE(outcome.file, rig.out(QStringLiteral("zoindex.htm")));
+        QCOMPARE(rig.user.messages.size(), 1);
+        QCOMPARE(rig.user.messages.constFirst().icon, MessageIcon::Information);
         QCOMPARE(rig.stages->names().size(), 4);
     }
 
@@ -294,7 +295,7 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.stages->pagesResult = Status::fault(QStringLiteral("disk full"));
-        const RunOutcome outcome = rig.control->produceCatalog();
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
         QCOMPARE(rig.user.messages.constFirst().text, QStringLiteral("disk full"));
         QVERIFY(!rig.stages->names().contains(QStringLiteral("CreateCSS")));
@@ -305,7 +306,7 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.stages->firstPage.clear();
-        const RunOutcome outcome = rig.control->produceCatalog();
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::NoItems);
         QVERIFY(rig.user.browsed.isEmpty());
         QCOMPARE(rig.user.messages.size(), 1);
@@ -317,19 +318,19 @@ private Q_SLOTS:
     void stopRequestIsClearedWhereRunsStart()
     {
         Rig rig;
-        rig.control->cmdStop_Click();
+        rig.control->requestStop();
         QCOMPARE(rig.user.yields, 1);
         rig.stages->during = [&rig](const QString &stage) {
             if (stage == QLatin1String("BuildAndCollectData"))
-                rig.control->cmdStop_Click();
+                rig.control->requestStop();
         };
-        rig.control->produceCatalog();
+        rig.control->makeCatalog();
         QCOMPARE(rig.stages->stopSeen, (QList<bool>{false, false, false, false}));
         QVERIFY(rig.control->runState().StopRequested == false);
 
-        rig.control->cmdStop_Click();
+        rig.control->requestStop();
         rig.stages->during = {};
-        rig.control->produceList(true);
+        rig.control->makeList(true);
         QCOMPARE(rig.stages->stopSeen.mid(4), (QList<bool>{false, false}));
     }
 
@@ -341,13 +342,13 @@ private Q_SLOTS:
         rig.stages->during = [&](const QString &stage) {
             if (stage == QLatin1String("BuildAndCollectData")) {
                 QVERIFY(rig.control->isRunning());
-                nested = rig.control->cmdRunMailing_Click();
-                rig.control->CmdPreview_Click();
-                rig.control->settings().txtTopTitle = QStringLiteral("changed");
-                rig.control->CmdDef_Click();
+                nested = rig.control->askAndMakeCatalog();
+                rig.control->askAndMakeList();
+                rig.control->settings().topTitle = QStringLiteral("changed");
+                rig.control->saveSettings();
             }
         };
-        rig.control->produceCatalog();
+        rig.control->makeCatalog();
         QCOMPARE(nested.ending, RunOutcome::Ending::Declined);
         QVERIFY(rig.user.questions.isEmpty());
         QCOMPARE(rig.stages->names().count(QStringLiteral("BuildAndCollectData")), 1);
@@ -359,7 +360,7 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.user.browserResult = Status::fault(QStringLiteral("no browser"));
-        const RunOutcome outcome = rig.control->produceCatalog();
+        const RunOutcome outcome = rig.control->makeCatalog();
         QCOMPARE(outcome.ending, RunOutcome::Ending::Failed);
         QCOMPARE(outcome.file, rig.out(QStringLiteral("zoindex.htm")));
         QCOMPARE(rig.user.messages.constFirst().text, QStringLiteral("no browser"));

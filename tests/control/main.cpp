@@ -3,13 +3,9 @@
 #include <QCoreApplication>
 
 ZORBIN_DECLARE_TEST(NumbersTest)
-ZORBIN_DECLARE_TEST(SettingsPersistenceTest)
 ZORBIN_DECLARE_TEST(CatalogControlTest)
-ZORBIN_DECLARE_TEST(ProgressMeterTest)
 
 ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
 ZORBIN_TEST_ADD(NumbersTest)
-ZORBIN_TEST_ADD(SettingsPersistenceTest)
 ZORBIN_TEST_ADD(CatalogControlTest)
-ZORBIN_TEST_ADD(ProgressMeterTest)
 ZORBIN_TEST_MAIN_END

@@ -1,8 +1,8 @@
 #include "dialogs/SelectItemDialog.h"
 
-#include "model/CatalogSettings.h"
 #include "control/ItemSelection.h"
 #include "dialogs/ItemListModel.h"
+#include "model/CatalogSettings.h"
 #include "output/CatalogQuery.h"
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
@@ -205,15 +205,14 @@ private Q_SLOTS:
 
         // The catalog's own statement leaves it out.
         CatalogSettings settings;
-        settings.CmbSortBy.setCurrentIndex(0);
-        settings.CmbSortDir.setCurrentIndex(0);
-        const auto sql = BuildFinalSQL(settings);
-        QVERIFY2(sql.isOk(), qPrintable(sql.status().description()));
+        settings.sortKey = SortKey::ItemKey;
+        settings.sortDirection = SortDirection::Ascending;
+        const QString sql = BuildFinalSQL(settings);
         auto database = WorkDatabase::open(m_path);
         QVERIFY(database.isOk());
         QStringList catalogKeys;
         {
-            auto query = database.value()->select(sql.value());
+            auto query = database.value()->select(sql);
             QVERIFY2(query.isOk(), qPrintable(query.status().description()));
             while (query->next())
                 catalogKeys << query->value(QStringLiteral("ItemKey")).toString();

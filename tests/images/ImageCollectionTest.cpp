@@ -1,11 +1,11 @@
 #include "output/ImageCollection.h"
 
 #include "model/CatalogSettings.h"
-#include "output/CopiedPictures.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
+#include "output/CopiedPictures.h"
 #include "platform/ForwardingFileSystem.h"
-#include "model/ConnectionParams.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/TestFiles.h"
@@ -47,10 +47,10 @@ struct Catalog
     {
         QDir(root.path()).mkpath(QStringLiteral("pictures"));
         QDir(root.path()).mkpath(QStringLiteral("images"));
-        settings.lines[0].tag = QStringLiteral("0"); // the picture
-        settings.lines[1].tag = QStringLiteral("2"); // the name
-        settings.CmbSortBy.setCurrentIndex(0);
-        settings.CmbSortDir.setCurrentIndex(0);
+        settings.lines[0].field = 0; // the picture
+        settings.lines[1].field = 2; // the name
+        settings.sortKey = SortKey::ItemKey;
+        settings.sortDirection = SortDirection::Ascending;
     }
 
     QString picture(const QString &name) const { return root.filePath(QStringLiteral("pictures/") + name); }
@@ -203,10 +203,10 @@ private Q_SLOTS:
     void theLogoAloneWithoutAPictureLine()
     {
         Catalog catalog;
-        catalog.settings.lines[0].tag = QStringLiteral("1"); // the key instead of the picture
+        catalog.settings.lines[0].field = 1; // the key instead of the picture
         catalog.makeItems(picturesNamed(catalog, 3));
         writeFile(catalog.picture(u"logo.png"_qs), "logo");
-        catalog.settings.txtLogo = catalog.picture(u"logo.png"_qs);
+        catalog.settings.logo = catalog.picture(u"logo.png"_qs);
         const Status status = catalog.collect();
         QVERIFY2(status.isOk(), qPrintable(status.description()));
         QCOMPARE(catalog.imageFiles(), QStringList{u"logo.png"_qs});
@@ -219,7 +219,7 @@ private Q_SLOTS:
         Catalog catalog;
         catalog.makeItems({});
         writeFile(catalog.picture(u"logo.png"_qs), "logo");
-        catalog.settings.txtLogo = catalog.picture(u"logo.png"_qs);
+        catalog.settings.logo = catalog.picture(u"logo.png"_qs);
         QVERIFY(catalog.collect().isOk());
         QCOMPARE(catalog.imageFiles(), QStringList{u"logo.png"_qs});
     }
@@ -228,7 +228,7 @@ private Q_SLOTS:
     {
         Catalog catalog;
         catalog.makeItems(picturesNamed(catalog, 1));
-        catalog.settings.txtLogo = catalog.picture(u"no-logo.png"_qs);
+        catalog.settings.logo = catalog.picture(u"no-logo.png"_qs);
         QVERIFY(catalog.collect().isOk());
         QCOMPARE(catalog.imageFiles(), QStringList{u"p01.jpg"_qs});
     }

@@ -75,7 +75,7 @@ private Q_SLOTS:
         const QString images = out + QStringLiteral("images");
         QVERIFY(QDir().mkpath(images));
         // The copies that the picture step makes in the file-per-page mode.
-        if (output.settings.cmbPageSplit.currentIndex() == 1)
+        if (output.settings.pageSplit == PageSplit::FilePerPage)
             copyPictures(images);
 
         const auto first = CreateCatHTML(output.context, out + QStringLiteral("zo"), db, images);

@@ -131,7 +131,7 @@ Status loadGoldenSettings(const QString &caseName, const QString &root, CatalogS
         return Status::fault(QStringLiteral("settings of %1 not applied: %2")
                                  .arg(caseName, persistence.unappliedKeys().join(QStringLiteral(", "))));
     if (goldenTestValue(caseName, QStringLiteral("OnlyWithPic")) == QLatin1String("1"))
-        settings.ChkOnlyWithPic = CheckValue::Checked;
+        settings.onlyWithPicture = true;
     return Status::ok();
 }
 

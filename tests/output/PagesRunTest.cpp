@@ -5,6 +5,7 @@
 #include "output/ListPage.h"
 #include "platform/FileSystem.h"
 #include "testutil/FaultyFileSystem.h"
+#include "testutil/StoredOptions.h"
 #include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
 #include "workdb/RowWriter.h"
@@ -78,13 +79,13 @@ private:
     {
         QVERIFY(QDir(out()).removeRecursively());
         QVERIFY(QDir().mkpath(out(QStringLiteral("images"))));
-        output.settings.txtRows = QStringLiteral("2");
-        output.settings.txtCols = QStringLiteral("2");
-        QVERIFY(output.settings.cmbPageSplit.setCurrentIndex(filePerPage ? 1 : 0));
-        QVERIFY(output.settings.CmbSortBy.setCurrentIndex(0));
-        QVERIFY(output.settings.CmbSortDir.setCurrentIndex(0));
-        output.settings.lines[0].tag = QStringLiteral("2");
-        output.settings.lines[1].tag = QStringLiteral("1");
+        output.settings.rows = 2;
+        output.settings.columns = 2;
+        output.settings.pageSplit = filePerPage ? PageSplit::FilePerPage : PageSplit::OneFile;
+        output.settings.sortKey = SortKey::ItemKey;
+        output.settings.sortDirection = SortDirection::Ascending;
+        output.settings.lines[0].field = 2;
+        output.settings.lines[1].field = 1;
     }
 
     Result<QString> pages(test::OutputContext &output, const QString &db)
@@ -162,9 +163,9 @@ private Q_SLOTS:
         QVERIFY2(made.isOk(), qPrintable(made.description()));
         test::OutputContext output;
         prepare(output, false);
-        output.settings.txtRows = QStringLiteral("1");
-        output.settings.txtCols = QStringLiteral("1");
-        output.settings.txtBottomPercent = QStringLiteral("5");
+        output.settings.rows = 1;
+        output.settings.columns = 1;
+        output.settings.bottomPercent = 5;
         QVERIFY(pages(output, many).isOk());
         const QByteArray page = test::readFile(out(QStringLiteral("zoindex.htm")));
         QCOMPARE(page.count("<table height='100%' width='100%'>"), 32768);
@@ -173,8 +174,8 @@ private Q_SLOTS:
 
         test::OutputContext large;
         prepare(large, true);
-        large.settings.txtRows = QStringLiteral("200");
-        large.settings.txtCols = QStringLiteral("200");
+        large.settings.rows = 200;
+        large.settings.columns = 200;
         QVERIFY(pages(large, m_sevenItems).isOk());
         QCOMPARE(test::readFile(out(QStringLiteral("zoindex.htm"))).count("<td class=D1>"), 40000);
         QCOMPARE(large.user.widths.size(), 40000 / 5 + 2);
@@ -183,29 +184,20 @@ private Q_SLOTS:
     void failuresBeforeAnyPage_data()
     {
         QTest::addColumn<QString>("rows");
-        QTest::addColumn<QString>("tag");
         QTest::addColumn<bool>("missingDatabase");
         QTest::addColumn<QString>("named");
-        QTest::newRow("rows not a number")
-            << QStringLiteral("x") << QStringLiteral("2") << false << QStringLiteral("מספר השורות");
-        QTest::newRow("tag not a number")
-            << QStringLiteral("2") << QStringLiteral("שם") << false << QStringLiteral("\"שם\"");
-        QTest::newRow("tag names no field")
-            << QStringLiteral("2") << QStringLiteral("9") << false << QStringLiteral("השדות הם 0 עד 8");
-        QTest::newRow("no working database")
-            << QStringLiteral("2") << QStringLiteral("2") << true << QString();
+        QTest::newRow("rows not a number") << QStringLiteral("x") << false << QStringLiteral("\"שורות\"");
+        QTest::newRow("no working database") << QStringLiteral("2") << true << QString();
     }
 
     void failuresBeforeAnyPage()
     {
         QFETCH(QString, rows);
-        QFETCH(QString, tag);
         QFETCH(bool, missingDatabase);
         QFETCH(QString, named);
         test::OutputContext output;
         prepare(output, true);
-        output.settings.txtRows = rows;
-        output.settings.lines[3].tag = tag;
+        test::setStored(output.settings, QStringLiteral("Rows"), rows);
         const auto first =
             pages(output, missingDatabase ? m_dir.filePath(QStringLiteral("none.db")) : m_sevenItems);
         QVERIFY(!first.isOk());
@@ -243,7 +235,7 @@ private Q_SLOTS:
         }
         test::OutputContext output;
         prepare(output, false);
-        output.settings.lines[2].tag = QStringLiteral("4");
+        output.settings.lines[2].field = 4;
         const auto first = pages(output, db);
         QVERIFY(!first.isOk());
         QVERIFY(first.status().description().contains(QStringLiteral("abc")));

@@ -44,8 +44,8 @@ private Q_SLOTS:
     {
         QTemporaryDir dir;
         test::OutputContext output;
-        output.settings.txtRows = QStringLiteral("1");
-        output.settings.txtCols = QStringLiteral("1");
+        output.settings.rows = 1;
+        output.settings.columns = 1;
         QCOMPARE(css(output, dir),
                  fixedLines() + " .D1 {width:100.0%; height:100.0%; text-align: center}\r\n");
     }
@@ -54,17 +54,17 @@ private Q_SLOTS:
     {
         QTemporaryDir dir;
         test::OutputContext output;
-        output.settings.txtRows = QStringLiteral("3");
-        output.settings.txtCols = QStringLiteral("2");
-        output.settings.chkRules = CheckValue::Checked;
+        output.settings.rows = 3;
+        output.settings.columns = 2;
+        output.settings.frameItems = true;
         CellLine &plain = output.settings.lines[2];
-        plain.tag = QStringLiteral("6");
+        plain.field = 6;
         plain.format = {1, 10, 2, 0, 0, 0};
         CellLine &both = output.settings.lines[4];
-        both.tag = QStringLiteral("0");
+        both.field = 0;
         both.format = {2, 12, 1, 1, 1, 2};
         CellLine &unknownWords = output.settings.lines[8];
-        unknownWords.tag = QStringLiteral("1");
+        unknownWords.field = 1;
         unknownWords.format = {7, 255, 9, 2, 3, 5};
         QCOMPARE(
             css(output, dir),
@@ -92,43 +92,16 @@ private Q_SLOTS:
         QVERIFY(test::readFile(path).startsWith("@charset"));
     }
 
-    void badGridFailsBeforeWriting_data()
-    {
-        QTest::addColumn<QString>("rows");
-        QTest::addColumn<QString>("columns");
-        QTest::addColumn<QString>("named");
-        QTest::newRow("rows not a number")
-            << QStringLiteral("x") << QStringLiteral("3") << QStringLiteral("השורות");
-        QTest::newRow("no rows") << QStringLiteral("0") << QStringLiteral("3") << QStringLiteral("השורות");
-        QTest::newRow("no columns") << QStringLiteral("8") << QStringLiteral("0")
-                                    << QStringLiteral("העמודות");
-        QTest::newRow("negative") << QStringLiteral("8") << QStringLiteral("-2") << QStringLiteral("העמודות");
-        QTest::newRow("empty") << QString() << QStringLiteral("3") << QStringLiteral("השורות");
-    }
-
     void badGridFailsBeforeWriting()
     {
-        QFETCH(QString, rows);
-        QFETCH(QString, columns);
-        QFETCH(QString, named);
         QTemporaryDir dir;
         test::writeFile(dir.filePath(QStringLiteral("tarnik.css")), "old");
         test::OutputContext output;
-        output.settings.txtRows = rows;
-        output.settings.txtCols = columns;
+        output.settings.rows.reset();
         const Status written = CreateCSS(output.context, dir.path(), true);
         QVERIFY(!written.isOk());
-        QVERIFY(written.description().contains(named));
+        QVERIFY(written.description().contains(QStringLiteral("\"שורות\"")));
         QCOMPARE(test::readFile(dir.filePath(QStringLiteral("tarnik.css"))), QByteArray("old"));
-    }
-
-    void tagThatIsNotANumberFails()
-    {
-        QTemporaryDir dir;
-        test::OutputContext output;
-        output.settings.lines[1].tag = QStringLiteral("x");
-        QVERIFY(!CreateCSS(output.context, dir.path(), true).isOk());
-        QVERIFY(!QFile::exists(dir.filePath(QStringLiteral("tarnik.css"))));
     }
 
     void fileInUseFails()

@@ -1,7 +1,7 @@
 #include "source/ChoiceLists.h"
 
 #include "DemoExpectations.h"
-#include "control/CatalogControl.h"
+#include "control/Program.h"
 #include "platform/FileSystem.h"
 #include "platform/SettingsStore.h"
 #include "testutil/AccountingFixture.h"
@@ -56,14 +56,14 @@ private Q_SLOTS:
         FillCmbExtraNote(demo, settings);
         FillCmbPriceField(demo, settings);
         // Ascending NoteID; kinds of other owners, blank, empty and Null names left out; names trimmed.
-        QCOMPARE(entriesOf(settings.cmbPicExtraNote), DemoNotes);
-        QCOMPARE(entriesOf(settings.cmbExtraNote1), DemoNotes);
-        QCOMPARE(entriesOf(settings.cmbExtraNote2), DemoNotes);
+        QCOMPARE(entriesOf(settings.pictureNote), DemoNotes);
+        QCOMPARE(entriesOf(settings.extraNote1), DemoNotes);
+        QCOMPARE(entriesOf(settings.extraNote2), DemoNotes);
         // The sales price first, then the price lists in the order the table returns them.
-        QCOMPARE(entriesOf(settings.cmbPriceField), DemoPriceLists);
-        QCOMPARE(entriesOf(settings.cmbPriceField2), DemoPriceLists);
+        QCOMPARE(entriesOf(settings.priceList1), DemoPriceLists);
+        QCOMPARE(entriesOf(settings.priceList2), DemoPriceLists);
         // Clearing a list drops its selection.
-        QCOMPARE(settings.cmbPriceField.currentIndex(), -1);
+        QCOMPARE(settings.priceList1.currentIndex(), -1);
     }
 
     void followsTheRowsOfTheNamesTables_data()
@@ -103,11 +103,11 @@ private Q_SLOTS:
         markLists(settings);
         FillCmbExtraNote(fileConnection(path), settings);
         FillCmbPriceField(fileConnection(path), settings);
-        QCOMPARE(entriesOf(settings.cmbPicExtraNote), notes);
-        QCOMPARE(entriesOf(settings.cmbExtraNote1), notes);
-        QCOMPARE(entriesOf(settings.cmbExtraNote2), notes);
-        QCOMPARE(entriesOf(settings.cmbPriceField), priceLists);
-        QCOMPARE(entriesOf(settings.cmbPriceField2), priceLists);
+        QCOMPARE(entriesOf(settings.pictureNote), notes);
+        QCOMPARE(entriesOf(settings.extraNote1), notes);
+        QCOMPARE(entriesOf(settings.extraNote2), notes);
+        QCOMPARE(entriesOf(settings.priceList1), priceLists);
+        QCOMPARE(entriesOf(settings.priceList2), priceLists);
     }
 
     // A failure ends the filling at once and silently; what was added so far stays.
@@ -122,9 +122,9 @@ private Q_SLOTS:
         CatalogSettings settings;
         markLists(settings);
         FillCmbExtraNote(fileConnection(path), settings);
-        QCOMPARE(entriesOf(settings.cmbPicExtraNote),
+        QCOMPARE(entriesOf(settings.pictureNote),
                  (Entries{{QStringLiteral("a"), 1}, {QStringLiteral("c"), 3}}));
-        QCOMPARE(entriesOf(settings.cmbExtraNote2),
+        QCOMPARE(entriesOf(settings.extraNote2),
                  (Entries{{QStringLiteral("a"), 1}, {QStringLiteral("c"), 3}}));
 
         // A names table without the name column: the rows are there, the names are not.
@@ -134,7 +134,7 @@ private Q_SLOTS:
                    QStringLiteral("INSERT INTO PriceListNames VALUES (1, 'a')")}));
         markLists(settings);
         FillCmbPriceField(fileConnection(path), settings);
-        QCOMPARE(entriesOf(settings.cmbPriceField), (Entries{{QStringLiteral("מחיר מכירה"), 0}}));
+        QCOMPARE(entriesOf(settings.priceList1), (Entries{{QStringLiteral("מחיר מכירה"), 0}}));
     }
 
     void nothingChangesWhenTheDatabaseCannotBeReached()
@@ -145,7 +145,7 @@ private Q_SLOTS:
         markLists(settings);
         FillCmbExtraNote(unreachable, settings);
         FillCmbPriceField(unreachable, settings);
-        unreachable.type = NoConnectionType;
+        unreachable.kind = ConnectionKind::None;
         FillCmbExtraNote(unreachable, settings);
         FillCmbPriceField(unreachable, settings);
         QVERIFY(listsAreMarked(settings));
@@ -176,37 +176,38 @@ private Q_SLOTS:
         QTemporaryDir folder;
         auto store = copyDemoSettings(folder.path());
         RecordingUserPort user;
-        CatalogControl control(user, *store, localFileSystem());
-        control.UserControl_Initialize();
+        const auto assembled = assembleControl(user, *store);
+        CatalogControl &control = *assembled;
+        control.startUp();
         CatalogSettings &settings = control.settings();
-        QCOMPARE(control.connection().type, std::int16_t(FileConnection));
-        QCOMPARE(entriesOf(settings.cmbPriceField), DemoPriceLists);
-        QCOMPARE(entriesOf(settings.cmbExtraNote2), DemoNotes);
-        QCOMPARE(settings.cmbPriceField.currentIndex(), 1);
-        QCOMPARE(settings.cmbPriceField.currentItemData(), std::optional<std::int32_t>(1));
-        QCOMPARE(settings.cmbExtraNote1.currentIndex(), 1);
-        QCOMPARE(settings.cmbExtraNote1.currentItemData(), std::optional<std::int32_t>(2));
-        QCOMPARE(settings.cmbPicExtraNote.currentItemData(), std::optional<std::int32_t>(3));
+        QCOMPARE(control.connection().kind, ConnectionKind::File);
+        QCOMPARE(entriesOf(settings.priceList1), DemoPriceLists);
+        QCOMPARE(entriesOf(settings.extraNote2), DemoNotes);
+        QCOMPARE(settings.priceList1.currentIndex(), 1);
+        QCOMPARE(settings.priceList1.currentItemData(), std::optional<std::int32_t>(1));
+        QCOMPARE(settings.extraNote1.currentIndex(), 1);
+        QCOMPARE(settings.extraNote1.currentItemData(), std::optional<std::int32_t>(2));
+        QCOMPARE(settings.pictureNote.currentItemData(), std::optional<std::int32_t>(3));
         QVERIFY(control.persistence().unappliedKeys().isEmpty());
         QVERIFY(user.messages.isEmpty());
         QVERIFY(user.questions.isEmpty());
 
         // The rest of the demo's settings read back as the script wrote them: a picture, the
         // name, the key and a price in each cell, a file per page, pictures of at most 120 x 120.
-        QCOMPARE(settings.lines[0].tag, QStringLiteral("0"));
-        QCOMPARE(settings.lines[1].tag, QStringLiteral("2"));
-        QCOMPARE(settings.lines[2].tag, QStringLiteral("1"));
+        QCOMPARE(settings.lines[0].field, 0);
+        QCOMPARE(settings.lines[1].field, 2);
+        QCOMPARE(settings.lines[2].field, 1);
         QCOMPARE(settings.lines[2].caption, QStringLiteral("פריט: "));
-        QCOMPARE(settings.lines[3].tag, QStringLiteral("4"));
-        QCOMPARE(settings.lines[4].tag, QString());
+        QCOMPARE(settings.lines[3].field, 4);
+        QVERIFY(!settings.lines[4].isUsed());
         QCOMPARE(settings.lines[1].format.weight, std::uint8_t(1));
-        QCOMPARE(settings.chkUsePriceField, CheckValue::Checked);
-        QCOMPARE(settings.cmbPageSplit.currentIndex(), 1);
-        QCOMPARE(settings.OptPicSource.selected(), int(PictureFromFileField));
-        QCOMPARE(settings.txtImageH, QStringLiteral("120"));
-        QCOMPARE(settings.txtImageW, QStringLiteral("120"));
-        QCOMPARE(settings.txtTopTitle2, QStringLiteral("בית וגן בע\"מ"));
-        QVERIFY(QFileInfo(settings.txtLogo).isFile());
+        QVERIFY(settings.collectPrice1);
+        QCOMPARE(settings.pageSplit, PageSplit::FilePerPage);
+        QCOMPARE(settings.pictureSource, PictureSource::FileField);
+        QCOMPARE(settings.pictureHeight, 120);
+        QCOMPARE(settings.pictureWidth, 120);
+        QCOMPARE(settings.topTitle2, QStringLiteral("בית וגן בע\"מ"));
+        QVERIFY(QFileInfo(settings.logo).isFile());
     }
 
     void startUpWithoutTheDatabaseSaysNothing()
@@ -216,11 +217,11 @@ private Q_SLOTS:
         store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("ConnServer"),
                      folder.path());
         RecordingUserPort user;
-        CatalogControl control(user, *store, localFileSystem());
-        control.UserControl_Initialize();
-        for (ChoiceList *list : control.settings().sourceLists())
+        const auto control = assembleControl(user, *store);
+        control->startUp();
+        for (ChoiceList *list : control->settings().sourceLists())
             QCOMPARE(list->count(), 0);
-        QVERIFY(control.persistence().unappliedKeys().contains(QStringLiteral("PriceField")));
+        QVERIFY(control->persistence().unappliedKeys().contains(QStringLiteral("PriceField")));
         QVERIFY(user.messages.isEmpty());
     }
 };

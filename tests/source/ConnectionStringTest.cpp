@@ -24,7 +24,7 @@ private Q_SLOTS:
         QCOMPARE(params.user, QStringLiteral("sa"));
         QCOMPARE(params.password, QString());
         QCOMPARE(params.database, QStringLiteral("tarnik02"));
-        QCOMPARE(params.type, std::int16_t(1));
+        QCOMPARE(params.kind, ConnectionKind::Odbc);
         QCOMPARE(BuildConnString(params),
                  QStringLiteral("driver={SQL Server};server=server;uid=sa;pwd=;database=tarnik02"));
     }
@@ -43,7 +43,7 @@ private Q_SLOTS:
         QCOMPARE(params.user, QString());
         QCOMPARE(params.password, QStringLiteral("secret"));
         QCOMPARE(params.database, QStringLiteral("company7"));
-        QCOMPARE(params.type, std::int16_t(2));
+        QCOMPARE(params.kind, ConnectionKind::OleDb);
     }
 
     void storedTypeIsTheListIndexPlusOne_data()
@@ -68,9 +68,9 @@ private Q_SLOTS:
         MemorySettingsStore store;
         store.set(QStringLiteral("ConnType"), stored);
         ConnectionParams params;
-        params.type = 3;
+        params.kind = ConnectionKind::File;
         GetRegConnParams(store, params);
-        QCOMPARE(int(params.type), type < 0 ? 3 : type);
+        QCOMPARE(int(params.kind), type < 0 ? 3 : type);
     }
 
     void buildsTheStringOfEachType_data()
@@ -149,7 +149,8 @@ private Q_SLOTS:
         QFETCH(QString, database);
         QFETCH(int, type);
         QFETCH(QString, expected);
-        QCOMPARE(BuildConnString(server, user, password, database, std::int16_t(type)), expected);
+        QCOMPARE(BuildConnString(server, user, password, database, static_cast<ConnectionKind>(type)),
+                 expected);
     }
 
     // A value that would split the string goes between braces (ODBC) or double quotes (OLE DB).
@@ -179,7 +180,7 @@ private Q_SLOTS:
         QFETCH(int, type);
         QFETCH(QString, expected);
         QCOMPARE(BuildConnString(QStringLiteral("s"), QStringLiteral("u"), password, QStringLiteral("d"),
-                                 std::int16_t(type)),
+                                 static_cast<ConnectionKind>(type)),
                  expected);
     }
 
@@ -195,12 +196,13 @@ private Q_SLOTS:
     void valuesSurviveTheRoundTrip()
     {
         QFETCH(QString, value);
-        const QString odbc = BuildConnString(value, value, value, value, OdbcConnection);
+        const QString odbc = BuildConnString(value, value, value, value, ConnectionKind::Odbc);
         QCOMPARE(connStringValue(odbc, QStringLiteral("server")), value);
         QCOMPARE(connStringValue(odbc, QStringLiteral("pwd")), value);
         QCOMPARE(connStringValue(odbc, QStringLiteral("database")), value);
         QCOMPARE(splitConnString(odbc).size(), 5);
-        const QString oleDb = BuildConnString(value, QStringLiteral("u"), value, value, OleDbConnection);
+        const QString oleDb =
+            BuildConnString(value, QStringLiteral("u"), value, value, ConnectionKind::OleDb);
         const QString asParsed =
             oleDbConnValue(value) == value ? value.trimmed() : value; // OLE DB trims a bare value
         QCOMPARE(connStringValue(oleDb, QStringLiteral("Data Source")), asParsed);
@@ -227,7 +229,7 @@ private Q_SLOTS:
         QFETCH(QString, user);
         QFETCH(QString, expected);
         const QString oleDb = BuildConnString(QStringLiteral("srv"), user, QStringLiteral("p"),
-                                              QStringLiteral("db"), OleDbConnection);
+                                              QStringLiteral("db"), ConnectionKind::OleDb);
         QCOMPARE(odbcConnStringForOleDb(oleDb), expected);
     }
 

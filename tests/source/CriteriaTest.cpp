@@ -19,7 +19,7 @@ const QString Fixed = QStringLiteral(" And Items.ItemKey <> '#' And Items.ItemKe
 void setCutOff(CatalogSettings &settings, const QStringList &positions)
 {
     for (int i = 0; i < CutOffPositions; ++i)
-        settings.ItemCutOff[std::size_t(i)] = i < positions.size() ? positions.at(i) : QStringLiteral("*");
+        settings.cutOff[std::size_t(i)] = i < positions.size() ? positions.at(i) : QStringLiteral("*");
 }
 
 QStringList texts(std::initializer_list<const char *> values)
@@ -50,8 +50,8 @@ private Q_SLOTS:
     void nothingTickedGivesTheFixedCondition()
     {
         CatalogSettings settings;
-        settings.txtFromSort = QStringLiteral("10");
-        settings.txtFromItem = QStringLiteral("100");
+        settings.sortCodeFrom = QStringLiteral("10");
+        settings.itemKeyFrom = QStringLiteral("100");
         setCutOff(settings, {QStringLiteral("A")});
         QCOMPARE(criteria(settings), Fixed);
     }
@@ -59,13 +59,13 @@ private Q_SLOTS:
     void allThreeConditionsInTheirOrder()
     {
         CatalogSettings settings;
-        settings.ChkCatCode = CheckValue::Checked;
-        settings.txtFromSort = QStringLiteral("10");
-        settings.txtToSort = QStringLiteral("20");
-        settings.chkFilter = CheckValue::Checked;
+        settings.sortCodeRange = true;
+        settings.sortCodeFrom = QStringLiteral("10");
+        settings.sortCodeTo = QStringLiteral("20");
+        settings.cutOffFilter = true;
         setCutOff(settings, {QStringLiteral("A"), QStringLiteral("*"), QStringLiteral("B")});
-        settings.ChkItemKey = CheckValue::Checked;
-        settings.txtFromItem = QStringLiteral("100");
+        settings.itemKeyRange = true;
+        settings.itemKeyFrom = QStringLiteral("100");
         QCOMPARE(criteria(settings),
                  QStringLiteral(
                      " And Items.ItemKey <> '#' And Items.ItemKey <> '*' And Items.SortGroup >= 10 And "
@@ -150,14 +150,14 @@ private Q_SLOTS:
         QFETCH(QString, toItem);
         QFETCH(QString, added);
         CatalogSettings settings;
-        settings.ChkCatCode = CheckValue(catCode);
-        settings.txtFromSort = fromSort;
-        settings.txtToSort = toSort;
-        settings.chkFilter = CheckValue(filter);
+        settings.sortCodeRange = catCode == 1;
+        settings.sortCodeFrom = fromSort;
+        settings.sortCodeTo = toSort;
+        settings.cutOffFilter = filter == 1;
         setCutOff(settings, cutOff);
-        settings.ChkItemKey = CheckValue(itemKey);
-        settings.txtFromItem = fromItem;
-        settings.txtToItem = toItem;
+        settings.itemKeyRange = itemKey == 1;
+        settings.itemKeyFrom = fromItem;
+        settings.itemKeyTo = toItem;
         QCOMPARE(criteria(settings), Fixed + added);
     }
 
@@ -197,27 +197,27 @@ private Q_SLOTS:
         QFETCH(QString, field);
         QFETCH(QString, offending);
         CatalogSettings settings;
-        settings.ChkCatCode = CheckValue::Checked;
-        settings.txtFromSort = fromSort;
-        settings.txtToSort = toSort;
+        settings.sortCodeRange = true;
+        settings.sortCodeFrom = fromSort;
+        settings.sortCodeTo = toSort;
         const auto built = BuildSourceDBCriteria(settings);
         QVERIFY(!built);
         QVERIFY2(built.status().description().contains(QLatin1Char('"') + field + QLatin1Char('"')),
                  qPrintable(built.status().description()));
         QVERIFY(built.status().description().contains(QLatin1Char('"') + offending + QLatin1Char('"')));
         // The same text with the box off is not looked at.
-        settings.ChkCatCode = CheckValue::Unchecked;
+        settings.sortCodeRange = false;
         QVERIFY(BuildSourceDBCriteria(settings));
     }
 
     void doublesApostrophesInQuotedTexts()
     {
         CatalogSettings settings;
-        settings.chkFilter = CheckValue::Checked;
+        settings.cutOffFilter = true;
         setCutOff(settings, {QStringLiteral("'")});
-        settings.ChkItemKey = CheckValue::Checked;
-        settings.txtFromItem = QStringLiteral("O'Brien");
-        settings.txtToItem = QStringLiteral("x' Or '1'='1");
+        settings.itemKeyRange = true;
+        settings.itemKeyFrom = QStringLiteral("O'Brien");
+        settings.itemKeyTo = QStringLiteral("x' Or '1'='1");
         QCOMPARE(criteria(settings),
                  Fixed + QStringLiteral(" And Items.Filter Like '''_________' And Items.ItemKey >= "
                                         "'O''Brien' And Items.ItemKey <= 'x'' Or ''1''=''1'"));
@@ -233,9 +233,9 @@ private Q_SLOTS:
             path, {QStringLiteral("INSERT INTO Items (ItemKey) VALUES ('A1'), ('B2'), ('C3'), "
                                   "('x'' Or ''1''=''1'), ('#')")}));
         CatalogSettings settings;
-        settings.ChkItemKey = CheckValue::Checked;
-        settings.txtFromItem = QStringLiteral("x' Or '1'='1");
-        settings.txtToItem = QStringLiteral("x' Or '1'='1");
+        settings.itemKeyRange = true;
+        settings.itemKeyFrom = QStringLiteral("x' Or '1'='1");
+        settings.itemKeyTo = QStringLiteral("x' Or '1'='1");
         auto source = SourceConnection::open(BuildConnString(fileConnection(path)));
         QVERIFY2(source, qPrintable(source.status().description()));
         auto rows = source.value()->select(

@@ -47,11 +47,11 @@ void checkListsFillFromDemo(const ConnectionParams &params)
     CatalogSettings settings;
     FillCmbExtraNote(params, settings);
     FillCmbPriceField(params, settings);
-    QCOMPARE(entriesOf(settings.cmbPicExtraNote), demoNoteEntries());
-    QCOMPARE(entriesOf(settings.cmbExtraNote1), demoNoteEntries());
-    QCOMPARE(entriesOf(settings.cmbExtraNote2), demoNoteEntries());
-    QCOMPARE(entriesOf(settings.cmbPriceField), demoPriceListEntries());
-    QCOMPARE(entriesOf(settings.cmbPriceField2), demoPriceListEntries());
+    QCOMPARE(entriesOf(settings.pictureNote), demoNoteEntries());
+    QCOMPARE(entriesOf(settings.extraNote1), demoNoteEntries());
+    QCOMPARE(entriesOf(settings.extraNote2), demoNoteEntries());
+    QCOMPARE(entriesOf(settings.priceList1), demoPriceListEntries());
+    QCOMPARE(entriesOf(settings.priceList2), demoPriceListEntries());
 }
 
 void checkLogonTestSucceeds(const ConnectionParams &params)

@@ -254,7 +254,7 @@ private Q_SLOTS:
     void noConnectionTypeNeverConnects()
     {
         const auto opened = SourceConnection::open(BuildConnString(
-            QStringLiteral("s"), QStringLiteral("u"), QString(), QStringLiteral("d"), NoConnectionType));
+            QStringLiteral("s"), QStringLiteral("u"), QString(), QStringLiteral("d"), ConnectionKind::None));
         QVERIFY(!opened);
         QVERIFY(opened.status().description().contains(QStringLiteral("סוג בסיס הנתונים")));
     }

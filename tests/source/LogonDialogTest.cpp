@@ -125,7 +125,7 @@ private Q_SLOTS:
         QFETCH(int, index);
         MemorySettingsStore store;
         ConnectionParams params{QStringLiteral("srv"), QStringLiteral("u"), QStringLiteral("p"),
-                                QStringLiteral("db"), std::int16_t(type)};
+                                QStringLiteral("db"), static_cast<ConnectionKind>(type)};
         frmLogon dialog(store, params);
         QCOMPARE(child<QLineEdit>(dialog, "txtConnServer")->text(), QStringLiteral("srv"));
         QCOMPARE(child<QLineEdit>(dialog, "txtConnUID")->text(), QStringLiteral("u"));
@@ -163,7 +163,7 @@ private Q_SLOTS:
         QCOMPARE(dialog.result(), int(QDialog::Rejected));
         QCOMPARE(store.writes, 0);
         QCOMPARE(params.server, QString());
-        QCOMPARE(params.type, std::int16_t(NoConnectionType));
+        QCOMPARE(params.kind, ConnectionKind::None);
     }
 
     void aDatabaseWithoutAccountsFailsTheTest()
@@ -207,7 +207,7 @@ private Q_SLOTS:
         QCOMPARE(params.user, QStringLiteral("catalog"));
         QCOMPARE(params.password, QStringLiteral("a;b"));
         QCOMPARE(params.database, QStringLiteral("company"));
-        QCOMPARE(int(params.type), type);
+        QCOMPARE(int(params.kind), type);
         QCOMPARE(store.get(QStringLiteral("ConnServer")), QStringLiteral("SRV\\SQL"));
         QCOMPARE(store.get(QStringLiteral("ConnUID")), QStringLiteral("catalog"));
         QCOMPARE(store.get(QStringLiteral("ConnPWD")), QStringLiteral("a;b"));

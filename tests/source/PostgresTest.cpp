@@ -56,7 +56,7 @@ private Q_SLOTS:
     {
         QVERIFY(m_trickyPassword.contains(QLatin1Char(';')) && m_trickyPassword.contains(QLatin1Char('}')));
         checkLogonTestSucceeds(
-            {QStringLiteral("127.0.0.1"), m_trickyUser, m_trickyPassword, m_database, OdbcConnection});
+            {QStringLiteral("127.0.0.1"), m_trickyUser, m_trickyPassword, m_database, ConnectionKind::Odbc});
     }
 
     void aWrongPasswordFailsWithTheDriversText()
@@ -86,14 +86,14 @@ private Q_SLOTS:
         FillCmbExtraNote(reader(), settings);
         FillCmbPriceField(reader(), settings);
         qputenv("PGPORT", m_port.toLatin1());
-        QCOMPARE(entriesOf(settings.cmbExtraNote1), demoNoteEntries());
-        QCOMPARE(entriesOf(settings.cmbPriceField2), demoPriceListEntries());
+        QCOMPARE(entriesOf(settings.extraNote1), demoNoteEntries());
+        QCOMPARE(entriesOf(settings.priceList2), demoPriceListEntries());
     }
 
 private:
     ConnectionParams reader() const
     {
-        return {QStringLiteral("127.0.0.1"), m_user, m_password, m_database, OdbcConnection};
+        return {QStringLiteral("127.0.0.1"), m_user, m_password, m_database, ConnectionKind::Odbc};
     }
 
     void checkFailure(const ConnectionParams &params, const QString &expected)

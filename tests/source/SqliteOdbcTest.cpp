@@ -32,11 +32,11 @@ private Q_SLOTS:
         QTest::addColumn<int>("type");
         QTest::addColumn<QString>("user");
         QTest::addColumn<QString>("password");
-        QTest::newRow("ODBC") << int(OdbcConnection) << "sa"
+        QTest::newRow("ODBC") << int(ConnectionKind::Odbc) << "sa"
                               << "";
-        QTest::newRow("OLE DB through the ODBC driver") << int(OleDbConnection) << "sa"
+        QTest::newRow("OLE DB through the ODBC driver") << int(ConnectionKind::OleDb) << "sa"
                                                         << "pw";
-        QTest::newRow("OLE DB, integrated security") << int(OleDbConnection) << ""
+        QTest::newRow("OLE DB, integrated security") << int(ConnectionKind::OleDb) << ""
                                                      << "";
     }
     void connectsWithTheOdbcString()
@@ -44,7 +44,7 @@ private Q_SLOTS:
         QFETCH(int, type);
         QFETCH(QString, user);
         QFETCH(QString, password);
-        const ConnectionParams params = serverParams(std::int16_t(type), user, password);
+        const ConnectionParams params = serverParams(static_cast<ConnectionKind>(type), user, password);
         checkLogonTestSucceeds(params);
         checkListsFillFromDemo(params);
         checkItemQueryReadsDemo(params);
@@ -52,7 +52,7 @@ private Q_SLOTS:
 
     void theFaultIsTheDriversOwnText()
     {
-        ConnectionParams params = serverParams(OdbcConnection, QStringLiteral("sa"), QString());
+        ConnectionParams params = serverParams(ConnectionKind::Odbc, QStringLiteral("sa"), QString());
         params.database = m_folder.filePath(QStringLiteral("no-such-folder/accounting.db"));
         const auto opened = SourceConnection::open(BuildConnString(params));
         QVERIFY(!opened);
@@ -62,7 +62,7 @@ private Q_SLOTS:
     }
 
 private:
-    ConnectionParams serverParams(std::int16_t type, const QString &user, const QString &password) const
+    ConnectionParams serverParams(ConnectionKind type, const QString &user, const QString &password) const
     {
         return {QStringLiteral("127.0.0.1"), user, password, m_database, type};
     }

@@ -103,7 +103,7 @@ ConnectionParams fileConnection(const QString &path)
     ConnectionParams params;
     params.server = QDir::toNativeSeparators(file.absolutePath());
     params.database = file.fileName();
-    params.type = FileConnection;
+    params.kind = ConnectionKind::File;
     return params;
 }
 

@@ -13,39 +13,48 @@ namespace zorbin::test {
 class RecordingStages final : public CatalogStages
 {
 public:
-    explicit RecordingStages(RunContext &context) : m_context(context) {}
-
-    void GetRegConnParams() override { record(QStringLiteral("GetRegConnParams()")); }
-    void FillCmbExtraNote() override { record(QStringLiteral("FillCmbExtraNote()")); }
-    void FillCmbPriceField() override { record(QStringLiteral("FillCmbPriceField()")); }
-    Status BuildAndCollectData() override
+    void GetRegConnParams(RunContext &context) override
     {
-        m_context.state.WorkDBFile = workDBFile;
-        record(QStringLiteral("BuildAndCollectData()"));
-        return collectResult;
+        record(context, QStringLiteral("GetRegConnParams()"));
     }
-    Status CollectCatImages(const QString &imagesFolder, const QString &dbFile) override
+    void FillCmbExtraNote(RunContext &context) override
     {
-        record(QStringLiteral("CollectCatImages(%1,%2)").arg(imagesFolder, dbFile));
+        record(context, QStringLiteral("FillCmbExtraNote()"));
+    }
+    void FillCmbPriceField(RunContext &context) override
+    {
+        record(context, QStringLiteral("FillCmbPriceField()"));
+    }
+    Result<CollectionReport> BuildAndCollectData(RunContext &context) override
+    {
+        context.state.WorkDBFile = workDBFile;
+        record(context, QStringLiteral("BuildAndCollectData()"));
+        if (!collectResult)
+            return collectResult;
+        return CollectionReport{stepFailure, context.state.StopRequested};
+    }
+    Status CollectCatImages(RunContext &context, const QString &imagesFolder, const QString &dbFile) override
+    {
+        record(context, QStringLiteral("CollectCatImages(%1,%2)").arg(imagesFolder, dbFile));
         return imagesResult;
     }
-    Result<QString> CreateCatHTML(const QString &pagePrefix, const QString &dbFile,
+    Result<QString> CreateCatHTML(RunContext &context, const QString &pagePrefix, const QString &dbFile,
                                   const QString &imagesFolder) override
     {
-        record(QStringLiteral("CreateCatHTML(%1,%2,%3)").arg(pagePrefix, dbFile, imagesFolder));
+        record(context, QStringLiteral("CreateCatHTML(%1,%2,%3)").arg(pagePrefix, dbFile, imagesFolder));
         if (!pagesResult)
             return pagesResult;
         return firstPage;
     }
-    Status CreateCSS(const QString &outputFolder, bool replace) override
+    Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace) override
     {
-        record(QStringLiteral("CreateCSS(%1,%2)")
-                   .arg(outputFolder, replace ? QStringLiteral("true") : QStringLiteral("false")));
+        record(context, QStringLiteral("CreateCSS(%1,%2)")
+                            .arg(outputFolder, replace ? QStringLiteral("true") : QStringLiteral("false")));
         return cssResult;
     }
-    Status CreateListHTML(const QString &fileName, const QString &dbFile) override
+    Status CreateListHTML(RunContext &context, const QString &fileName, const QString &dbFile) override
     {
-        record(QStringLiteral("CreateListHTML(%1,%2)").arg(fileName, dbFile));
+        record(context, QStringLiteral("CreateListHTML(%1,%2)").arg(fileName, dbFile));
         return listResult;
     }
 
@@ -61,7 +70,8 @@ public:
     QStringList calls;
     QString workDBFile = QStringLiteral("/tmp/zorbindb.tmp");
     QString firstPage = QStringLiteral("/out/zoindex.htm");
-    Status collectResult;
+    Status collectResult; // a failure the collection cannot start with
+    Status stepFailure;   // a failed step of a collection that started
     Status imagesResult;
     Status pagesResult;
     Status cssResult;
@@ -72,15 +82,13 @@ public:
     QList<bool> stopSeen;
 
 private:
-    void record(const QString &call)
+    void record(const RunContext &context, const QString &call)
     {
         calls << call;
-        stopSeen << m_context.state.StopRequested;
+        stopSeen << context.state.StopRequested;
         if (during)
             during(call.left(call.indexOf(QLatin1Char('('))));
     }
-
-    RunContext &m_context;
 };
 
 } // namespace zorbin::test

@@ -54,7 +54,7 @@ ConnectionParams odbcConnection(const QString &path)
     params.user = QStringLiteral("catalog");
     params.password = QStringLiteral("secret");
     params.database = QFileInfo(path).absoluteFilePath();
-    params.type = OdbcConnection;
+    params.kind = ConnectionKind::Odbc;
     return params;
 }
 

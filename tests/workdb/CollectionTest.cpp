@@ -1,8 +1,8 @@
 #include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "platform/FileSystem.h"
-#include "model/ConnectionParams.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 #include "testutil/AccountingFixture.h"
@@ -115,7 +115,22 @@ private:
             qWarning("%s", qPrintable(made.description()));
         return path;
     }
-    Status collect() { return BuildAndCollectData(*m_context); }
+    Result<CollectionReport> collect() { return BuildAndCollectData(*m_context); }
+    // A collection that starts and runs every step.
+    void collectAll()
+    {
+        const Result<CollectionReport> report = collect();
+        QVERIFY2(report, qPrintable(report.status().description()));
+        QVERIFY2(report->stepFailure, qPrintable(report->stepFailure.description()));
+    }
+    // A collection that starts and ends early at a failed step: that step's failure.
+    Status failedStep()
+    {
+        const Result<CollectionReport> report = collect();
+        if (!report)
+            return Status::fault(QStringLiteral("escaped: ") + report.status().description());
+        return report->stepFailure;
+    }
     QStringList rows(const QString &table) const
     {
         QStringList described;
@@ -159,8 +174,8 @@ private Q_SLOTS:
         QFETCH_GLOBAL(bool, odbc);
         m_odbc = odbc;
         m_settings = std::make_unique<CatalogSettings>();
-        m_settings->OptPicSource.setValue(PictureFromFileField, true);
-        m_settings->CmbItemNameType.setCurrentIndex(0);
+        m_settings->pictureSource = PictureSource::FileField;
+        m_settings->itemName = ItemNameSource::Standard;
         m_connection = connectionTo(m_smallSource);
         m_state = RunState();
         m_user = RecordingUserPort();
@@ -186,19 +201,17 @@ private Q_SLOTS:
 
     void copiesItemsSortGroupsPricesAndNotes()
     {
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
-        m_settings->ChkUsePriceField2 = CheckValue::Checked;
-        choose(m_settings->cmbPriceField2, 2);
-        m_settings->ChkUseExtraNote1 = CheckValue::Checked;
-        choose(m_settings->cmbExtraNote1, 1);
-        m_settings->ChkUseExtraNote2 = CheckValue::Checked;
-        choose(m_settings->cmbExtraNote2, 2);
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
+        m_settings->collectPrice2 = true;
+        choose(m_settings->priceList2, 2);
+        m_settings->collectNote1 = true;
+        choose(m_settings->extraNote1, 1);
+        m_settings->collectNote2 = true;
+        choose(m_settings->extraNote2, 2);
 
-        QVERIFY(collect());
+        collectAll();
         QCOMPARE(m_state.WorkDBFile, workDatabasePath());
-        QVERIFY(!m_state.CollectFailed);
-        QVERIFY2(m_user.messages.isEmpty(), qPrintable(m_user.messages.value(0).text));
         QCOMPARE(
             m_user.statuses,
             QStringList({QStringLiteral("מאתחל בסיס נתונים זמני"), QStringLiteral("סורק את רשימת הפריטים"),
@@ -239,11 +252,9 @@ private Q_SLOTS:
             if (m_user.yields == 2)
                 m_state.StopRequested = true;
         };
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
-        QVERIFY(collect());
-        QVERIFY(!m_state.CollectFailed);
-        QVERIFY(m_user.messages.isEmpty());
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
+        collectAll();
         QCOMPARE(keys(QStringLiteral("tItems")),
                  QStringList({QStringLiteral("A100"), QStringLiteral("a200"), QStringLiteral("ab"),
                               QStringLiteral("B300"), QStringLiteral("C400"), QStringLiteral("D500"),
@@ -279,9 +290,9 @@ private Q_SLOTS:
     {
         QFETCH(QString, folder);
         QFETCH(QString, expected);
-        m_settings->OptPicSource.setValue(PictureFromItemKey, true);
-        m_settings->txtPicPath = folder;
-        m_settings->txtPicExtension = QStringLiteral(".JPG");
+        m_settings->pictureSource = PictureSource::ItemKey;
+        m_settings->pictureFolder = folder;
+        m_settings->pictureExtension = QStringLiteral(".JPG");
         QVERIFY(collect());
         QCOMPARE(readWorkTable(m_state.WorkDBFile, QStringLiteral("tItems")).at(2).at(7).toString(),
                  expected);
@@ -289,9 +300,9 @@ private Q_SLOTS:
 
     void picturesFromAnExtraNoteLeaveOutItemsWithoutOne()
     {
-        m_settings->OptPicSource.setValue(PictureFromExtraNote, true);
-        choose(m_settings->cmbPicExtraNote, 2);
-        m_settings->CmbItemNameType.setCurrentIndex(1);
+        m_settings->pictureSource = PictureSource::ExtraNote;
+        choose(m_settings->pictureNote, 2);
+        m_settings->itemName = ItemNameSource::Foreign;
         QVERIFY(collect());
         QCOMPARE(rows(QStringLiteral("tItems")),
                  QStringList({QStringLiteral("ab|?|2|BX|סט|3|$|/pics/note-ab.png|-1"),
@@ -300,7 +311,7 @@ private Q_SLOTS:
 
     void foreignNames()
     {
-        m_settings->CmbItemNameType.setCurrentIndex(1);
+        m_settings->itemName = ItemNameSource::Foreign;
         QVERIFY(collect());
         const QList<QVariantList> items = readWorkTable(m_state.WorkDBFile, QStringLiteral("tItems"));
         QCOMPARE(items.at(2).at(1).toString(), QStringLiteral("Oak chair"));
@@ -317,15 +328,10 @@ private Q_SLOTS:
                  "INSERT INTO Items (ItemKey, ItemName) VALUES ('K1','a'),('K2','b'),('K3','c'),('K4','d'),"
                  "('K5','e'),('K6','%1'),('K7','g')")
                  .arg(longName)}));
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
-        QVERIFY(collect());
-        QVERIFY(m_state.CollectFailed);
-        QCOMPARE(m_user.messages.size(), 1);
-        QCOMPARE(m_user.messages[0].text,
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
+        QCOMPARE(failedStep().description(),
                  QStringLiteral("פריט K6: הטקסט ארוך מדי לשדה ItemName, שמקבל עד 100 תווים."));
-        QCOMPARE(m_user.messages[0].title, QStringLiteral("תקלה"));
-        QCOMPARE(m_user.messages[0].icon, MessageIcon::Information);
         QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
         // What was written before the failure stays; the bar keeps its last width.
         QCOMPARE(keys(QStringLiteral("tItems")).size(), 5);
@@ -343,15 +349,13 @@ private Q_SLOTS:
 
     void aChosenListWithoutSelectionEndsTheRun()
     {
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
-        m_settings->ChkUseExtraNote1 = CheckValue::Checked;
-        m_settings->cmbExtraNote1.clear();
-        const Status collected = collect();
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
+        m_settings->collectNote1 = true;
+        m_settings->extraNote1.clear();
+        const Result<CollectionReport> collected = collect();
         QVERIFY(!collected);
-        QVERIFY(collected.description().contains(QStringLiteral("נתון נוסף 1")));
-        QVERIFY(!m_state.CollectFailed);
-        QVERIFY(m_user.messages.isEmpty());
+        QVERIFY(collected.status().description().contains(QStringLiteral("נתון נוסף 1")));
         QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק נתון נוסף 1"));
         QCOMPARE(keys(QStringLiteral("tItems")).size(), SmallItems.size());
         QCOMPARE(keys(QStringLiteral("tItemPrice1")).size(), 2);
@@ -359,9 +363,9 @@ private Q_SLOTS:
 
     void onlyPriceListTwoFillsOnlyItsTable()
     {
-        m_settings->ChkUsePriceField2 = CheckValue::Checked;
-        choose(m_settings->cmbPriceField2, 2);
-        choose(m_settings->cmbPriceField, 1);
+        m_settings->collectPrice2 = true;
+        choose(m_settings->priceList2, 2);
+        choose(m_settings->priceList1, 1);
         QVERIFY(collect());
         QVERIFY(!m_user.statuses.contains(QStringLiteral("סורק מחירון ראשי")));
         QCOMPARE(keys(QStringLiteral("tItemPrice1")), QStringList());
@@ -371,15 +375,15 @@ private Q_SLOTS:
 
     void aSecondRunLeavesNothingOfTheFirst()
     {
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
         QVERIFY(collect());
         QCOMPARE(keys(QStringLiteral("tItemPrice1")).size(), 2);
 
-        m_settings->chkUsePriceField = CheckValue::Unchecked;
-        m_settings->ChkItemKey = CheckValue::Checked;
-        m_settings->txtFromItem = QStringLiteral("C");
-        m_settings->txtToItem = QStringLiteral("E");
+        m_settings->collectPrice1 = false;
+        m_settings->itemKeyRange = true;
+        m_settings->itemKeyFrom = QStringLiteral("C");
+        m_settings->itemKeyTo = QStringLiteral("E");
         QVERIFY(collect());
         QCOMPARE(keys(QStringLiteral("tItems")),
                  QStringList({QStringLiteral("C400"), QStringLiteral("D500")}));
@@ -389,11 +393,10 @@ private Q_SLOTS:
 
     void anEmptySelectionWritesNothingAndLeavesTheBar()
     {
-        m_settings->ChkItemKey = CheckValue::Checked;
-        m_settings->txtFromItem = QStringLiteral("תת");
+        m_settings->itemKeyRange = true;
+        m_settings->itemKeyFrom = QStringLiteral("תת");
         m_user.fillWidth = 300;
-        QVERIFY(collect());
-        QVERIFY(!m_state.CollectFailed);
+        collectAll();
         QCOMPARE(keys(QStringLiteral("tItems")), QStringList());
         QVERIFY(m_user.widths.isEmpty());
         QCOMPARE(m_user.fillWidth, 300);
@@ -402,33 +405,24 @@ private Q_SLOTS:
     void anUnreachableSourceIsShownOnceAndStopsTheRun()
     {
         m_connection = connectionTo(m_temp.filePath(QStringLiteral("missing/nothing.db")));
-        QVERIFY(collect());
-        QVERIFY(m_state.CollectFailed);
-        QCOMPARE(m_user.messages.size(), 1);
-        QCOMPARE(m_user.messages[0].icon, MessageIcon::Information);
+        QVERIFY(!failedStep());
         QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
     }
 
-    void aWorkingDatabaseThatCannotBeMadeStopsTheRunAtTheItems()
+    void aWorkingDatabaseThatCannotBeMadeEndsTheCollection()
     {
-        QVERIFY(collect());
+        collectAll();
         m_files.failingPaths.insert(workDatabasePath());
-        QVERIFY(collect());
+        QVERIFY(!collect());
         QCOMPARE(m_state.WorkDBFile, QString());
-        QVERIFY(m_state.CollectFailed);
-        QCOMPARE(m_user.messages.size(), 2);
-        QCOMPARE(m_user.messages[0].icon, MessageIcon::Critical);
-        QCOMPARE(m_user.messages[1].icon, MessageIcon::Information);
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
+        QCOMPARE(m_user.statuses.last(), QStringLiteral("מאתחל בסיס נתונים זמני"));
     }
 
     void aRefusedCriterionFailsTheItemStep()
     {
-        m_settings->ChkCatCode = CheckValue::Checked;
-        m_settings->txtFromSort = QStringLiteral("x");
-        QVERIFY(collect());
-        QVERIFY(m_state.CollectFailed);
-        QCOMPARE(m_user.messages.size(), 1);
+        m_settings->sortCodeRange = true;
+        m_settings->sortCodeFrom = QStringLiteral("x");
+        QVERIFY(failedStep().description().contains(QStringLiteral("מקוד מיון")));
     }
 
     void aSecondCollectionIsRefusedWhileOneRuns()
@@ -436,9 +430,9 @@ private Q_SLOTS:
         Result<std::unique_ptr<CollectionLock>> held = CollectionLock::acquire(workDatabasePath());
         QVERIFY(held);
         m_state.WorkDBFile = QStringLiteral("earlier");
-        const Status refused = collect();
+        const Result<CollectionReport> refused = collect();
         QVERIFY(!refused);
-        QVERIFY(refused.description().contains(QStringLiteral("איסוף נתונים אחר כבר פועל")));
+        QVERIFY(refused.status().description().contains(QStringLiteral("איסוף נתונים אחר כבר פועל")));
         QCOMPARE(m_state.WorkDBFile, QStringLiteral("earlier"));
         QVERIFY(m_user.statuses.isEmpty());
         held.value().reset();
@@ -449,12 +443,11 @@ private Q_SLOTS:
     void theDemoDatabase()
     {
         m_connection = connectionTo(demoDatabasePath());
-        m_settings->chkUsePriceField = CheckValue::Checked;
-        choose(m_settings->cmbPriceField, 1);
-        m_settings->ChkUseExtraNote2 = CheckValue::Checked;
-        choose(m_settings->cmbExtraNote2, 2);
-        QVERIFY(collect());
-        QVERIFY2(m_user.messages.isEmpty(), qPrintable(m_user.messages.value(0).text));
+        m_settings->collectPrice1 = true;
+        choose(m_settings->priceList1, 1);
+        m_settings->collectNote2 = true;
+        choose(m_settings->extraNote2, 2);
+        collectAll();
         const QStringList items = keys(QStringLiteral("tItems"));
         QVERIFY(items.size() > 250);
         QVERIFY(!items.contains(QStringLiteral("#")));

@@ -1,7 +1,7 @@
 #include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
-#include "model/ConnectionParams.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/TestFiles.h"
@@ -49,7 +49,7 @@ private Q_SLOTS:
     void createsTheFileInTheTemporaryFolder()
     {
         QCOMPARE(workDatabasePath(), expectedPath());
-        QCOMPARE(CreateWorkDB(m_context), expectedPath());
+        QCOMPARE(CreateWorkDB(m_context).value(), expectedPath());
         QVERIFY(m_user.messages.isEmpty());
         for (const QString &table : {QStringLiteral("tItems"), QStringLiteral("tItemSort")})
             QCOMPARE(readWorkTable(expectedPath(), table).size(), 0);
@@ -62,7 +62,7 @@ private Q_SLOTS:
         rows.other[QStringLiteral("tItemSort")] << QVariantList{1, QStringLiteral("old group")};
         QVERIFY(makeWorkDatabase(expectedPath(), rows));
         writeFile(expectedPath() + QStringLiteral("-journal"), QByteArray(512, 'j'));
-        QCOMPARE(CreateWorkDB(m_context), expectedPath());
+        QCOMPARE(CreateWorkDB(m_context).value(), expectedPath());
         QVERIFY(!QFile::exists(expectedPath() + QStringLiteral("-journal")));
         QCOMPARE(readWorkTable(expectedPath(), QStringLiteral("tItems")).size(), 0);
         QCOMPARE(readWorkTable(expectedPath(), QStringLiteral("tItemSort")).size(), 0);
@@ -72,11 +72,9 @@ private Q_SLOTS:
     {
         QVERIFY(makeWorkDatabase(expectedPath()));
         m_files.failingPaths.insert(expectedPath());
-        QCOMPARE(CreateWorkDB(m_context), QString());
-        QCOMPARE(m_user.messages.size(), 1);
-        QCOMPARE(m_user.messages[0].title, QStringLiteral("תקלה"));
-        QCOMPARE(m_user.messages[0].icon, MessageIcon::Critical);
-        QVERIFY(m_user.messages[0].text.contains(expectedPath()));
+        const Result<QString> created = CreateWorkDB(m_context);
+        QVERIFY(!created);
+        QVERIFY(created.status().description().contains(expectedPath()));
     }
 
     void aFolderThatCannotBeWrittenIsAFault()

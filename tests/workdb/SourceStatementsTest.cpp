@@ -55,10 +55,10 @@ private Q_SLOTS:
         QFETCH(int, nameType);
         QFETCH(QString, expected);
         CatalogSettings settings;
-        settings.OptPicSource.setValue(pictureSource, true);
-        settings.CmbItemNameType.setCurrentIndex(nameType);
-        settings.cmbPicExtraNote.addEntry(QStringLiteral("תמונה"), -3);
-        settings.cmbPicExtraNote.setCurrentIndex(0);
+        settings.pictureSource = static_cast<PictureSource>(pictureSource);
+        settings.itemName = static_cast<ItemNameSource>(nameType);
+        settings.pictureNote.addEntry(QStringLiteral("תמונה"), -3);
+        settings.pictureNote.setCurrentIndex(0);
         const Result<QString> statement = buildItemStatement(settings);
         QVERIFY(statement);
         QCOMPARE(statement.value(), expected);
@@ -67,15 +67,15 @@ private Q_SLOTS:
     void criteriaFollowEveryItemStatement()
     {
         CatalogSettings settings;
-        settings.OptPicSource.setValue(PictureFromItemKey, true);
-        settings.ChkCatCode = CheckValue::Checked;
-        settings.txtFromSort = QStringLiteral("10");
-        settings.txtToSort = QStringLiteral("20");
-        settings.chkFilter = CheckValue::Checked;
-        settings.ItemCutOff[0] = QStringLiteral("A");
-        settings.ItemCutOff[2] = QStringLiteral("B");
-        settings.ChkItemKey = CheckValue::Checked;
-        settings.txtFromItem = QStringLiteral("100");
+        settings.pictureSource = PictureSource::ItemKey;
+        settings.sortCodeRange = true;
+        settings.sortCodeFrom = QStringLiteral("10");
+        settings.sortCodeTo = QStringLiteral("20");
+        settings.cutOffFilter = true;
+        settings.cutOff[0] = QStringLiteral("A");
+        settings.cutOff[2] = QStringLiteral("B");
+        settings.itemKeyRange = true;
+        settings.itemKeyFrom = QStringLiteral("100");
         const QString criteria = QStringLiteral(
             " And Items.ItemKey <> '#' And Items.ItemKey <> '*' And Items.SortGroup >= 10 And Items.SortGroup <= 20 And Items.Filter Like 'A_B_______' And Items.ItemKey >= '100'");
         QVERIFY(buildItemStatement(settings).value().endsWith(QStringLiteral("WHERE Not (ItemKey Is Null)") +
@@ -108,14 +108,14 @@ private Q_SLOTS:
     void faultsBeforeAnyStatementIsSent()
     {
         CatalogSettings settings;
-        settings.OptPicSource.setValue(PictureFromExtraNote, true);
+        settings.pictureSource = PictureSource::ExtraNote;
         const Result<QString> noNote = buildItemStatement(settings);
         QVERIFY(!noNote);
         QVERIFY(noNote.status().description().contains(QStringLiteral("נתון נוסף")));
 
-        settings.OptPicSource.setValue(PictureFromFileField, true);
-        settings.ChkCatCode = CheckValue::Checked;
-        settings.txtFromSort = QStringLiteral("1 or 1=1");
+        settings.pictureSource = PictureSource::FileField;
+        settings.sortCodeRange = true;
+        settings.sortCodeFrom = QStringLiteral("1 or 1=1");
         QVERIFY(!buildItemStatement(settings));
         QVERIFY(!buildPriceStatement(settings, 1));
         QVERIFY(!buildExtraNoteStatement(settings, 1));

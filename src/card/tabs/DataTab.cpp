@@ -34,12 +34,13 @@ void showSourceList(QComboBox *list, const QString &caption)
 
 // A check box that switches a choice on, and the list to choose from.
 void addSwitchedChoice(QGridLayout *grid, int row, SettingsBinder &bind, const QString &checkName,
-                       const QString &caption, CheckValue &use, const QString &listName, ChoiceList &list)
+                       const QString &caption, const QString &useKey, const QString &listName,
+                       ChoiceList &list)
 {
     QWidget *parent = grid->parentWidget();
     auto *useBox = named<QCheckBox>(checkName, caption, parent);
     auto *choice = named<QComboBox>(listName, parent);
-    bind.check(useBox, use);
+    bind.check(useBox, useKey);
     bind.choice(choice, list);
     showSourceList(choice, caption);
     grid->addWidget(useBox, row, 0);
@@ -63,7 +64,8 @@ QWidget *DataTab::buildNames()
 {
     auto *group = new QGroupBox(QStringLiteral("שם הפריט"), this);
     auto *source = named<QComboBox>(QStringLiteral("CmbItemNameType"), group);
-    m_context.binder.choice(source, m_context.control.settings().CmbItemNameType);
+    m_context.binder.choice(source, QStringLiteral("ItemNameType"),
+                            {QStringLiteral("שם סטנדרטי"), QStringLiteral("שם לועזי")});
     auto *layout = new QHBoxLayout(group);
     layout->addWidget(captionFor(QStringLiteral("השם שיוצג:"), source, group));
     layout->addWidget(source);
@@ -77,11 +79,11 @@ QWidget *DataTab::buildPrices()
     auto *group = new QGroupBox(QStringLiteral("מחירונים"), this);
     auto *grid = new QGridLayout(group);
     addSwitchedChoice(grid, 0, m_context.binder, QStringLiteral("chkUsePriceField"),
-                      QStringLiteral("מחיר 1:"), settings.chkUsePriceField, QStringLiteral("cmbPriceField"),
-                      settings.cmbPriceField);
+                      QStringLiteral("מחיר 1:"), QStringLiteral("UsePriceField"),
+                      QStringLiteral("cmbPriceField"), settings.priceList1);
     addSwitchedChoice(grid, 1, m_context.binder, QStringLiteral("ChkUsePriceField2"),
-                      QStringLiteral("מחיר 2:"), settings.ChkUsePriceField2, QStringLiteral("cmbPriceField2"),
-                      settings.cmbPriceField2);
+                      QStringLiteral("מחיר 2:"), QStringLiteral("UsePriceField2"),
+                      QStringLiteral("cmbPriceField2"), settings.priceList2);
     grid->setColumnStretch(2, 1);
     return group;
 }
@@ -92,11 +94,11 @@ QWidget *DataTab::buildNotes()
     auto *group = new QGroupBox(QStringLiteral("נתונים נוספים"), this);
     auto *grid = new QGridLayout(group);
     addSwitchedChoice(grid, 0, m_context.binder, QStringLiteral("ChkUseExtraNote1"),
-                      QStringLiteral("נתון נוסף 1:"), settings.ChkUseExtraNote1,
-                      QStringLiteral("cmbExtraNote1"), settings.cmbExtraNote1);
+                      QStringLiteral("נתון נוסף 1:"), QStringLiteral("UseExtraNote1"),
+                      QStringLiteral("cmbExtraNote1"), settings.extraNote1);
     addSwitchedChoice(grid, 1, m_context.binder, QStringLiteral("ChkUseExtraNote2"),
-                      QStringLiteral("נתון נוסף 2:"), settings.ChkUseExtraNote2,
-                      QStringLiteral("cmbExtraNote2"), settings.cmbExtraNote2);
+                      QStringLiteral("נתון נוסף 2:"), QStringLiteral("UseExtraNote2"),
+                      QStringLiteral("cmbExtraNote2"), settings.extraNote2);
     grid->setColumnStretch(2, 1);
     return group;
 }
@@ -112,14 +114,15 @@ QWidget *DataTab::buildPictures()
     for (int i = 0; i < captions.size(); ++i)
         options.push_back(
             named<QRadioButton>(QStringLiteral("OptPicSource(%1)").arg(i), captions.at(i), group));
-    bind.options(options, settings.OptPicSource);
+    bind.options(options,
+                 {QStringLiteral("PicSource0"), QStringLiteral("PicSource1"), QStringLiteral("PicSource2")});
 
     auto *folder = named<QLineEdit>(QStringLiteral("txtPicPath"), group);
     auto *extension = named<QLineEdit>(QStringLiteral("txtPicExtension"), group);
     auto *note = named<QComboBox>(QStringLiteral("cmbPicExtraNote"), group);
-    bind.text(folder, settings.txtPicPath);
-    bind.text(extension, settings.txtPicExtension);
-    bind.choice(note, settings.cmbPicExtraNote);
+    bind.text(folder, QStringLiteral("PicPath"));
+    bind.text(extension, QStringLiteral("PicExtension"));
+    bind.choice(note, settings.pictureNote);
     tabs::fitToCharacters(extension, 5);
     tabs::showLeftToRight(folder);
     tabs::showLeftToRight(extension);

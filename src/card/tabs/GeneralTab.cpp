@@ -23,7 +23,7 @@ GeneralTab::GeneralTab(CardContext &context, QWidget *parent) : QWidget(parent),
     setObjectName(QStringLiteral("GeneralTab"));
     auto *outputGroup = new QGroupBox(QStringLiteral("פלט"), this);
     auto *folder = named<QLineEdit>(QStringLiteral("txtPagingPath"), outputGroup);
-    context.binder.text(folder, context.control.settings().txtPagingPath);
+    context.binder.text(folder, QStringLiteral("PagingPath"));
     tabs::showLeftToRight(folder);
     folder->setPlaceholderText(QStringLiteral("ריק: המחיצה הזמנית של המשתמש"));
     auto *folderField =

@@ -1,10 +1,11 @@
 #include "card/tabs/PageSetupTab.h"
 
 #include "card/CardContext.h"
+#include "card/CellLineEditor.h"
 #include "card/SettingsBinder.h"
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
-#include "card/CellLineEditor.h"
+#include "model/GridSize.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -29,7 +30,7 @@ PageSetupTab::PageSetupTab(CardContext &context, QWidget *parent) : QWidget(pare
     side->addWidget(buildPictureSize());
     auto *onlyWithPicture =
         named<QCheckBox>(QStringLiteral("ChkOnlyWithPic"), QStringLiteral("רק פריטים שיש להם תמונה"), this);
-    context.binder.check(onlyWithPicture, context.control.settings().ChkOnlyWithPic);
+    context.binder.check(onlyWithPicture, context.control.settings().onlyWithPicture);
     side->addWidget(onlyWithPicture);
     side->addStretch();
 
@@ -40,7 +41,6 @@ PageSetupTab::PageSetupTab(CardContext &context, QWidget *parent) : QWidget(pare
 
 QWidget *PageSetupTab::buildPage()
 {
-    CatalogSettings &settings = m_context.control.settings();
     SettingsBinder &bind = m_context.binder;
     auto *group = new QGroupBox(QStringLiteral("עמוד הקטלוג"), this);
     auto *rows = named<QLineEdit>(QStringLiteral("txtRows"), group);
@@ -48,11 +48,15 @@ QWidget *PageSetupTab::buildPage()
     auto *split = named<QComboBox>(QStringLiteral("cmbPageSplit"), group);
     auto *location = named<QComboBox>(QStringLiteral("cmbPicLocation"), group);
     auto *rules = named<QCheckBox>(QStringLiteral("chkRules"), QStringLiteral("מסגרת סביב כל פריט?"), group);
-    bind.number(rows, settings.txtRows, MaxLengthGridSize, NumericSetting::Rows);
-    bind.number(cols, settings.txtCols, MaxLengthGridSize, NumericSetting::Cols);
-    bind.choice(split, settings.cmbPageSplit);
-    bind.choice(location, settings.cmbPicLocation);
-    bind.check(rules, settings.chkRules);
+    bind.number(rows, QStringLiteral("Rows"), tabs::MaxLengthGridSize,
+                [](const std::optional<int> &typed) { return gridCountProblem(GridCount::Rows, typed); });
+    bind.number(cols, QStringLiteral("Cols"), tabs::MaxLengthGridSize,
+                [](const std::optional<int> &typed) { return gridCountProblem(GridCount::Columns, typed); });
+    bind.choice(split, QStringLiteral("PageSplit"),
+                {QStringLiteral("קובץ אחד"), QStringLiteral("קובץ לעמוד")});
+    bind.choice(location, QStringLiteral("PicLocation"),
+                {QStringLiteral("בהתאם לטבלה"), QStringLiteral("מימין לנתונים")});
+    bind.check(rules, QStringLiteral("Rules"));
 
     auto *grid = new QGridLayout(group);
     tabs::addFieldRow(grid, 0, QStringLiteral("שורות:"), rows, nullptr, Qt::AlignLeading);
@@ -65,12 +69,11 @@ QWidget *PageSetupTab::buildPage()
 
 QWidget *PageSetupTab::buildPictureSize()
 {
-    CatalogSettings &settings = m_context.control.settings();
     auto *group = new QGroupBox(QStringLiteral("גודל מקסימלי לתמונה: (בנקודות)"), this);
     auto *height = named<QLineEdit>(QStringLiteral("txtImageH"), group);
     auto *width = named<QLineEdit>(QStringLiteral("txtImageW"), group);
-    m_context.binder.number(height, settings.txtImageH, MaxLengthPictureSize, NumericSetting::ImageH);
-    m_context.binder.number(width, settings.txtImageW, MaxLengthPictureSize, NumericSetting::ImageW);
+    m_context.binder.number(height, QStringLiteral("ImageH"), tabs::MaxLengthPictureSize);
+    m_context.binder.number(width, QStringLiteral("ImageW"), tabs::MaxLengthPictureSize);
     height->setPlaceholderText(QStringLiteral("ללא"));
     width->setPlaceholderText(QStringLiteral("ללא"));
     auto *layout = new QHBoxLayout(group);

@@ -4,7 +4,6 @@
 #include "card/SettingsBinder.h"
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
-#include "model/UserPort.h"
 #include "dialogs/SelectItemDialog.h"
 
 #include <QCheckBox>
@@ -37,17 +36,18 @@ QWidget *RangeTab::buildRanges()
     SettingsBinder &bind = m_context.binder;
     auto *group = new QGroupBox(QStringLiteral("אילו פריטים ייכללו בקטלוג"), this);
     auto *grid = new QGridLayout(group);
+    grid->addWidget(new QLabel(QStringLiteral("בחירת פריטים מתוך הטווח:"), group), 0, 0, 1, 5);
 
-    auto range = [&](int row, const QString &checkName, const QString &checkCaption, CheckValue &use,
-                     const QString &fromName, QString &from, const QString &toName, QString &to,
-                     int maxLength) {
+    auto range = [&](int row, const QString &checkName, const QString &checkCaption, const QString &useKey,
+                     const QString &fromName, const QString &fromKey, const QString &toName,
+                     const QString &toKey, int maxLength) {
         auto *useBox = named<QCheckBox>(checkName, checkCaption, group);
         auto *fromBox = named<QLineEdit>(fromName, group);
         auto *toBox = named<QLineEdit>(toName, group);
-        bind.check(useBox, use);
+        bind.check(useBox, useKey);
         // Only the upper bound has an entry limit; the lower one takes a key of any length.
-        bind.text(fromBox, from);
-        bind.text(toBox, to, maxLength);
+        bind.text(fromBox, fromKey);
+        bind.text(toBox, toKey, maxLength);
         fromBox->setAccessibleName(checkCaption);
         tabs::fitToCharacters(fromBox, maxLength, QLatin1Char('0'));
         tabs::fitToCharacters(toBox, maxLength, QLatin1Char('0'));
@@ -56,15 +56,15 @@ QWidget *RangeTab::buildRanges()
         grid->addWidget(captionFor(QStringLiteral("עד:"), toBox, group), row, 2);
         grid->addWidget(toBox, row, 3);
     };
-    range(0, QStringLiteral("ChkCatCode"), QStringLiteral("מקוד מיון:"), settings.ChkCatCode,
-          QStringLiteral("txtFromSort"), settings.txtFromSort, QStringLiteral("txtToSort"),
-          settings.txtToSort, MaxLengthSortBound);
-    range(1, QStringLiteral("ChkItemKey"), QStringLiteral("מפריט:"), settings.ChkItemKey,
-          QStringLiteral("txtFromItem"), settings.txtFromItem, QStringLiteral("txtToItem"),
-          settings.txtToItem, MaxLengthItemBound);
+    range(1, QStringLiteral("ChkCatCode"), QStringLiteral("מקוד מיון:"), QStringLiteral("UseCatCode"),
+          QStringLiteral("txtFromSort"), QStringLiteral("FromSort"), QStringLiteral("txtToSort"),
+          QStringLiteral("ToSort"), tabs::MaxLengthSortBound);
+    range(2, QStringLiteral("ChkItemKey"), QStringLiteral("מפריט:"), QStringLiteral("UseItemKey"),
+          QStringLiteral("txtFromItem"), QStringLiteral("FromItem"), QStringLiteral("txtToItem"),
+          QStringLiteral("ToItem"), tabs::MaxLengthItemBound);
 
     auto *filter = named<QCheckBox>(QStringLiteral("chkFilter"), QStringLiteral("חתך:"), group);
-    bind.check(filter, settings.chkFilter);
+    bind.check(filter, QStringLiteral("UseFilter"));
     filter->setToolTip(QStringLiteral("תו בכל מקום בשדה המיון של הפריט; \"*\" מתאים לכל תו"));
     auto *pattern = new QWidget(group);
     auto *positions = new QHBoxLayout(pattern);
@@ -72,27 +72,34 @@ QWidget *RangeTab::buildRanges()
     positions->setSpacing(2);
     for (int position = 1; position <= CutOffPositions; ++position) {
         auto *box = named<QLineEdit>(QStringLiteral("ItemCutOff(%1)").arg(position), pattern);
-        bind.text(box, settings.ItemCutOff[static_cast<std::size_t>(position - 1)], MaxLengthCutOff);
+        // Positions beyond the stored ones keep what is typed until the program ends.
+        const auto index = static_cast<std::size_t>(position - 1);
+        if (position <= StoredCutOffPositions)
+            bind.text(box, QStringLiteral("CutOff%1").arg(position), tabs::MaxLengthCutOff);
+        else
+            bind.text(box, settings.cutOff[index], tabs::MaxLengthCutOff);
         box->setAlignment(Qt::AlignCenter);
         box->setAccessibleName(QStringLiteral("חתך, מקום %1").arg(position));
         tabs::fitToCharacters(box, 1);
         positions->addWidget(box);
     }
     positions->addStretch();
-    grid->addWidget(filter, 2, 0);
-    grid->addWidget(pattern, 2, 1, 1, 4);
+    grid->addWidget(filter, 3, 0);
+    grid->addWidget(pattern, 3, 1, 1, 4);
     grid->setColumnStretch(4, 1);
     return group;
 }
 
 QWidget *RangeTab::buildOrder()
 {
-    CatalogSettings &settings = m_context.control.settings();
     auto *group = new QGroupBox(QStringLiteral("סדר הפריטים בקטלוג"), this);
     auto *sortBy = named<QComboBox>(QStringLiteral("CmbSortBy"), group);
     auto *sortDir = named<QComboBox>(QStringLiteral("CmbSortDir"), group);
-    m_context.binder.choice(sortBy, settings.CmbSortBy);
-    m_context.binder.choice(sortDir, settings.CmbSortDir);
+    m_context.binder.choice(
+        sortBy, QStringLiteral("SortBy"),
+        {QStringLiteral("מפתח פריט"), QStringLiteral("שם פריט"), QStringLiteral("קוד מיון")});
+    m_context.binder.choice(sortDir, QStringLiteral("SortDir"),
+                            {QStringLiteral("עולה"), QStringLiteral("יורד")});
     auto *layout = new QHBoxLayout(group);
     layout->addWidget(captionFor(QStringLiteral("מיון לפי:"), sortBy, group));
     layout->addWidget(sortBy);
@@ -110,7 +117,7 @@ QWidget *RangeTab::buildSelection()
         named<QPushButton>(QStringLiteral("cmdSelectAccount"), QStringLiteral("בחירת פריטים..."), group);
     auto *useMarked = named<QCheckBox>(QStringLiteral("ChkSelectAccount"),
                                        QStringLiteral("הקטלוג יכלול רק את הפריטים שסומנו"), group);
-    m_context.binder.check(useMarked, settings.ChkSelectAccount);
+    m_context.binder.check(useMarked, settings.useMarkedItems);
     useMarked->setToolTip(
         QStringLiteral("כשהתיבה מסומנת, הקטלוג והרשימה נבנים מהפריטים שנאספו וסומנו, בלי לאסוף מחדש"));
     connect(select, &QPushButton::clicked, this, &RangeTab::cmdSelectAccount_Click);
@@ -123,23 +130,12 @@ QWidget *RangeTab::buildSelection()
 
 void RangeTab::cmdSelectAccount_Click()
 {
-    CatalogControl &control = m_context.control;
-    control.settings().ChkSelectAccount = CheckValue::Checked;
+    const RunOutcome prepared = m_context.control.prepareMarking();
     m_context.binder.refresh();
-
-    bool collectAnew = control.runState().WorkDBFile.isEmpty();
-    if (!collectAnew) {
-        collectAnew =
-            control.context().user.ask(QStringLiteral("לסרוק מחדש את רשימת הפריטים?"),
-                                       QStringLiteral("שימו לב"), QuestionButtons::YesNo) == Answer::Yes;
-    }
-    if (collectAnew) {
-        // The collection steps report their own failures; one that escaped them is told here,
-        // and the dialog then shows whatever the working database holds.
-        if (const Status collected = control.collect(); !collected)
-            control.context().user.tell(collected.description(), FaultTitle, MessageIcon::Critical);
-    }
-    frmSelectItem dialog(control.runState().WorkDBFile, window());
+    if (prepared.ending == RunOutcome::Ending::Declined)
+        return;
+    // Whatever the collection told, the dialog shows what the working database holds.
+    frmSelectItem dialog(prepared.file, window());
     dialog.exec();
 }
 

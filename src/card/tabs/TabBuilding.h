@@ -7,9 +7,17 @@
 class QGridLayout;
 class QLineEdit;
 
-// Small helpers that keep the tabs' construction readable: every widget that stands for a
-// member of the settings record carries that member's name as its objectName.
+// Small helpers that keep the tabs' construction readable: every widget that stands for an
+// option carries the widget name the option has always had as its objectName.
 namespace zorbin::tabs {
+
+// Entry limits of the settings page's text boxes, in characters.
+inline constexpr int MaxLengthSortBound = 15;  // txtToSort; txtFromSort has no limit
+inline constexpr int MaxLengthItemBound = 15;  // txtToItem; txtFromItem has no limit
+inline constexpr int MaxLengthGridSize = 3;    // txtRows, txtCols
+inline constexpr int MaxLengthPercent = 2;     // txtTopPercent, txtBottomPercent
+inline constexpr int MaxLengthPictureSize = 3; // txtImageH, txtImageW
+inline constexpr int MaxLengthCutOff = 1;      // each ItemCutOff box
 
 template <typename Widget, typename... Args> Widget *named(const QString &objectName, Args &&...args)
 {

@@ -6,6 +6,7 @@
 #include "card/tabs/TabBuilding.h"
 #include "control/CatalogControl.h"
 
+#include <QCheckBox>
 #include <QFileInfo>
 #include <QGridLayout>
 #include <QGroupBox>
@@ -37,17 +38,16 @@ TitlesTab::TitlesTab(CardContext &context, QWidget *parent) : QWidget(parent), m
 
 QWidget *TitlesTab::buildTitles()
 {
-    CatalogSettings &settings = m_context.control.settings();
     SettingsBinder &bind = m_context.binder;
     auto *group = new QGroupBox(QStringLiteral("כותרות"), this);
     auto *top = named<QLineEdit>(QStringLiteral("txtTopTitle"), group);
     auto *second = named<QLineEdit>(QStringLiteral("txtTopTitle2"), group);
     auto *bottom = named<QLineEdit>(QStringLiteral("txtBottomTitle"), group);
     m_txtLogo = named<QLineEdit>(QStringLiteral("txtLogo"), group);
-    bind.text(top, settings.txtTopTitle);
-    bind.text(second, settings.txtTopTitle2);
-    bind.text(bottom, settings.txtBottomTitle);
-    bind.text(m_txtLogo, settings.txtLogo);
+    bind.text(top, QStringLiteral("TopTitle"));
+    bind.text(second, QStringLiteral("TopTitle2"));
+    bind.text(bottom, QStringLiteral("BottomTitle"));
+    bind.text(m_txtLogo, QStringLiteral("Logo"));
     tabs::showLeftToRight(m_txtLogo);
 
     m_imgLogo = named<QToolButton>(QStringLiteral("imgLogo"), group);
@@ -70,19 +70,21 @@ QWidget *TitlesTab::buildTitles()
     tabs::addFieldRow(grid, 1, QStringLiteral("כותרת עליונה משנית:"), second);
     tabs::addFieldRow(grid, 2, QStringLiteral("כותרת תחתונה:"), bottom);
     tabs::addFieldRow(grid, 3, QStringLiteral("סמל (לוגו):"), m_txtLogo, logo);
+    auto *sections = named<QCheckBox>(QStringLiteral("chkWebSections"),
+                                      QStringLiteral("באתר: הפריטים בחלוקה לפי קבוצות מיון"), group);
+    bind.check(sections, QStringLiteral("WebSections"));
+    grid->addWidget(sections, 4, 1);
     grid->setColumnStretch(1, 1);
     return group;
 }
 
 QWidget *TitlesTab::buildBands()
 {
-    CatalogSettings &settings = m_context.control.settings();
     auto *group = new QGroupBox(QStringLiteral("גובה רצועות הכותרת"), this);
     auto *top = named<QLineEdit>(QStringLiteral("txtTopPercent"), group);
     auto *bottom = named<QLineEdit>(QStringLiteral("txtBottomPercent"), group);
-    m_context.binder.number(top, settings.txtTopPercent, MaxLengthPercent, NumericSetting::TopPercent);
-    m_context.binder.number(bottom, settings.txtBottomPercent, MaxLengthPercent,
-                            NumericSetting::BottomPercent);
+    m_context.binder.number(top, QStringLiteral("TopPercent"), tabs::MaxLengthPercent);
+    m_context.binder.number(bottom, QStringLiteral("BottomPercent"), tabs::MaxLengthPercent);
 
     auto *grid = new QGridLayout(group);
     tabs::addFieldRow(grid, 0, QStringLiteral("גובה הכותרת העליונה:"), top);

@@ -1,4 +1,4 @@
-#include "model/CellLineEditing.h"
+#include "card/CellLineEditing.h"
 
 #include "common/Numbers.h"
 #include "model/CatalogField.h"
@@ -18,13 +18,13 @@ void assignField(CellLine &line, int field)
 {
     if (field < 0 || field >= CatalogFieldCount)
         return;
-    line.tag = QString::number(field);
+    line.field = field;
     line.caption = catalogFields()[static_cast<std::size_t>(field)].caption + QLatin1Char(':');
 }
 
 void emptyLine(CellLine &line)
 {
-    line.tag.clear();
+    line.field.reset();
     line.caption.clear();
 }
 
