@@ -11,7 +11,7 @@ scripts/install-deps.sh
 build_dir=${PACKAGE_BUILD_DIR:-build-package}
 # Hardening and the other flags Debian builds its packages with (CMake reads no CPPFLAGS).
 eval "$(DEB_BUILD_MAINT_OPTIONS=hardening=+all dpkg-buildflags --export=sh)"
-export CXXFLAGS="$CXXFLAGS $CPPFLAGS"
+export CXXFLAGS="${CXXFLAGS:-} ${CPPFLAGS:-}"
 # The dates in the changelog and the AppStream metadata: the last commit's, so that a package
 # built twice from one commit is the same.
 SOURCE_DATE_EPOCH=${SOURCE_DATE_EPOCH:-$(git log -1 --format=%ct 2>/dev/null || date +%s)}
