@@ -15,6 +15,8 @@ packages=(
     postgresql xvfb xauth chromium clang libclang-rt-14-dev
     # the catalog's Hebrew fonts (David, Miriam) and a font for the settings page
     culmus fonts-dejavu-core
+    # the Debian package (scripts/package.sh): CPack's dependency lookup, its checks, manual pages
+    dpkg-dev file lintian appstream man-db
 )
 
 run() {

@@ -6,9 +6,24 @@
 
 #include <QApplication>
 #include <QIcon>
+#include <cstdio>
+#include <cstring>
 
 int main(int argc, char *argv[])
 {
+    // Answered before QApplication opens the window system, so that they work without a display.
+    for (int i = 1; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--version") == 0) {
+            std::printf("zorbin %s\n", ZORBIN_VERSION);
+            return 0;
+        }
+        if (std::strcmp(argv[i], "--help") == 0 || std::strcmp(argv[i], "-h") == 0) {
+            std::printf("Usage: zorbin [--help | --version] [Qt options]\n\n"
+                        "Opens the window that makes the HTML product catalog of the accounting database.\n"
+                        "zorbin-cli runs the same without a window; see zorbin(1) and zorbin-cli(1).\n");
+            return 0;
+        }
+    }
     zorbin::prepareProcess();
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Zorbin"));

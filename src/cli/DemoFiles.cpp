@@ -8,14 +8,26 @@ namespace zorbin::cli {
 
 namespace {
 const QString DemoSettingsName = QStringLiteral("demo-settings.ini");
+
+// The build tree's demo serves only a program run from that build tree: an installed program
+// reads the installed demo, whose settings and pictures name the installed folder, even when
+// the tree it was built in is still there.
+bool runsFromBuildTree()
+{
+    const QString tree = QFileInfo(QStringLiteral(ZORBIN_DEMO_BUILD_DIR "/..")).canonicalFilePath();
+    const QString program = QFileInfo(QCoreApplication::applicationDirPath()).canonicalFilePath();
+    return !tree.isEmpty() && (program == tree || program.startsWith(tree + QLatin1Char('/')));
 }
+} // namespace
 
 Result<DemoFiles> findDemoFiles()
 {
     QStringList candidates;
     if (const QString fromEnvironment = qEnvironmentVariable("ZORBIN_DEMO_DIR"); !fromEnvironment.isEmpty())
         candidates << fromEnvironment;
-    candidates << QStringLiteral(ZORBIN_DEMO_BUILD_DIR) << QStringLiteral(ZORBIN_DEMO_INSTALL_DIR)
+    if (runsFromBuildTree())
+        candidates << QStringLiteral(ZORBIN_DEMO_BUILD_DIR);
+    candidates << QStringLiteral(ZORBIN_DEMO_INSTALL_DIR)
                << QCoreApplication::applicationDirPath() + QStringLiteral("/../share/zorbin/demo");
     for (const QString &folder : candidates) {
         const QString settings = QDir(folder).filePath(DemoSettingsName);

@@ -7,6 +7,7 @@
 #include <QStringList>
 #include <map>
 #include <memory>
+#include <set>
 
 namespace zorbin {
 namespace {
@@ -46,22 +47,29 @@ public:
     void write(const QString &app, const QString &section, const QString &key, const QString &value) override
     {
         open(app)->setValue(section + QLatin1Char('/') + key, value);
+        m_written.insert(storeName(app));
     }
 
+    // Only a store that was written to is saved: a file that was only read is left as it is
+    // (a shared or installed settings file must not become its reader's only).
     void flush() override
     {
         for (const auto &[name, settings] : m_opened) {
+            if (!m_written.contains(name))
+                continue;
             createForOwnerOnly(settings->fileName());
             settings->sync();
             restrictToOwner(settings->fileName());
         }
+        m_written.clear();
     }
 
 private:
+    QString storeName(const QString &app) const { return m_fixedFile.isEmpty() ? app : QString(); }
+
     QSettings *open(const QString &app) const
     {
-        const QString name = m_fixedFile.isEmpty() ? app : QString();
-        auto &settings = m_opened[name];
+        auto &settings = m_opened[storeName(app)];
         if (!settings)
             settings = create(app);
         return settings.get();
@@ -108,6 +116,7 @@ private:
 
     QString m_fixedFile;
     mutable std::map<QString, std::unique_ptr<QSettings>> m_opened;
+    std::set<QString> m_written; // the names of the stores written to since the last flush
 };
 
 } // namespace

@@ -68,6 +68,29 @@ private Q_SLOTS:
         QCOMPARE(QFileInfo(path).permissions() & (OwnerOnly | OthersAndGroup), OwnerOnly);
 #endif
     }
+
+    // The demo's installed settings and a settings file given to zorbin-cli are only read: a
+    // run must leave them readable by whoever could read them before.
+    void aFileOnlyReadKeepsItsPermissions()
+    {
+#ifdef Q_OS_WIN
+        QSKIP("File permissions are a Unix matter.");
+#else
+        QTemporaryDir folder;
+        const QString path = folder.filePath(QStringLiteral("settings.ini"));
+        writeFile(path, "[Params]\nRows=4\n");
+        const auto readable = OwnerOnly | QFileDevice::ReadGroup | QFileDevice::ReadOther;
+        QVERIFY(QFile::setPermissions(path, readable));
+        {
+            auto store = openIniSettingsStore(path);
+            QCOMPARE(store->read(QStringLiteral("Zorbin"), QStringLiteral("Params"), QStringLiteral("Rows"),
+                                 QString()),
+                     QStringLiteral("4"));
+            store->flush();
+        }
+        QCOMPARE(QFileInfo(path).permissions() & (OwnerOnly | OthersAndGroup), readable);
+#endif
+    }
 };
 
 ZORBIN_TEST_CLASS(SettingsFileTest)

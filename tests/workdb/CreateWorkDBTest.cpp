@@ -46,6 +46,27 @@ private Q_SLOTS:
         m_files.failingPaths.clear();
     }
 
+    // Without TMPDIR the working database is not put into the temporary folder that every user
+    // shares, where another user's file of the same name would stop the run.
+    void withoutTmpdirTheFolderIsTheUsersOwn()
+    {
+#ifdef Q_OS_WIN
+        QSKIP("The temporary folder of Windows is the user's own.");
+#else
+        QTemporaryDir cache;
+        const QByteArray oldCache = qgetenv("XDG_CACHE_HOME");
+        qputenv("XDG_CACHE_HOME", QFile::encodeName(cache.path()));
+        qunsetenv("TMPDIR");
+        const QString path = workDatabasePath();
+        qputenv("TMPDIR", QFile::encodeName(m_temp.path()));
+        qputenv("XDG_CACHE_HOME", oldCache);
+        QCOMPARE(path, cache.filePath(QStringLiteral("zorbin/zorbindb.tmp")));
+        const auto everyone = QFileDevice::Permissions::fromInt(0x7077); // owner, group, others
+        QCOMPARE(QFileInfo(cache.filePath(QStringLiteral("zorbin"))).permissions() & everyone,
+                 QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+#endif
+    }
+
     void createsTheFileInTheTemporaryFolder()
     {
         QCOMPARE(workDatabasePath(), expectedPath());
