@@ -1,6 +1,6 @@
 #pragma once
 
-#include "source/LogonForm.h"
+#include "dialogs/LogonForm.h"
 
 #include <QDialog>
 

@@ -4,6 +4,8 @@
 #include "platform/HtmlReference.h"
 #include "platform/Paths.h"
 
+#include <QRegularExpression>
+
 namespace zorbin {
 
 QString HTMLFileName(const QString &pPrefix, std::int64_t Z)
@@ -72,8 +74,22 @@ QString escapeHtml(const QString &text)
     return escaped;
 }
 
+namespace {
+
+// A reference that names its scheme ("http://host/p.php?id=5&s=1#x"): its "?", "#" and "%" are
+// the URL's own and must reach the browser as they stand.
+bool isUrl(const QString &reference)
+{
+    static const QRegularExpression scheme(QStringLiteral("^[A-Za-z][A-Za-z0-9+.-]*://"));
+    return scheme.match(reference).hasMatch();
+}
+
+} // namespace
+
 QString attributeFileReference(const QString &path)
 {
+    if (isUrl(path))
+        return escapeHtml(path);
     QString encoded;
     encoded.reserve(path.size());
     for (const QChar c : path) {

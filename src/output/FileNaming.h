@@ -39,9 +39,11 @@ Result<double> NumOrZero(const QVariant &value);
 // ("&amp;", "&lt;", "&gt;", "&quot;", "&#39;").
 QString escapeHtml(const QString &text);
 
-// A file reference as it goes inside a src or href attribute between apostrophes: the marks
-// that a URL reads as its own syntax ("%", "#", "?") are percent-encoded so that the reference
-// keeps naming the same file, then the text is escaped as by escapeHtml.
+// A picture, logo or link reference as it goes inside a src or href attribute between
+// apostrophes, escaped as by escapeHtml. A file path has the marks that a URL reads as its own
+// syntax ("%", "#", "?") percent-encoded first, so that it keeps naming the same file; a URL (a
+// scheme followed by "://", such as "http://host/p.php?id=5&s=1#x") keeps them, since they are
+// part of its target.
 QString attributeFileReference(const QString &path);
 
 } // namespace zorbin

@@ -87,8 +87,8 @@ namespace {
 // the server and the database.
 QString sqlServerOdbc(const QString &server, const QString &login, const QString &database)
 {
-    return QStringLiteral("driver={SQL Server};server=") + odbcConnValue(server) + login +
-           QStringLiteral(";database=") + odbcConnValue(database);
+    return QStringLiteral("driver={SQL Server};server=") + server + login + QStringLiteral(";database=") +
+           database;
 }
 
 QString odbcLogin(const QString &user, const QString &password)
@@ -106,16 +106,16 @@ QString BuildConnString(const QString &server, const QString &user, const QStrin
         return sqlServerOdbc(server, odbcLogin(user, password), database);
     case ConnectionKind::OleDb:
         if (user.isEmpty())
-            return QStringLiteral("Provider=sqloledb;Data Source=") + oleDbConnValue(server) +
+            return QStringLiteral("Provider=sqloledb;Data Source=") + server +
                    QStringLiteral(";Integrated Security=SSPI") +
                    QStringLiteral(";Persist Security Info=False") + QStringLiteral(";Initial Catalog=") +
-                   oleDbConnValue(database);
-        return QStringLiteral("Provider=sqloledb;Data Source=") + oleDbConnValue(server) +
-               QStringLiteral(";User Id=") + oleDbConnValue(user) + QStringLiteral(";Password=") +
-               oleDbConnValue(password) + QStringLiteral(";Initial Catalog=") + oleDbConnValue(database);
+                   database;
+        return QStringLiteral("Provider=sqloledb;Data Source=") + server + QStringLiteral(";User Id=") +
+               oleDbConnValue(user) + QStringLiteral(";Password=") + oleDbConnValue(password) +
+               QStringLiteral(";Initial Catalog=") + database;
     case ConnectionKind::File:
         return QStringLiteral("Provider=Microsoft.Jet.OLEDB.4.0;Data Source=") +
-               oleDbConnValue(databaseFilePath(server, database));
+               databaseFilePath(server, database);
     case ConnectionKind::None:
         break;
     }

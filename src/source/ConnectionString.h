@@ -18,8 +18,10 @@ namespace zorbin {
 //     separator unless the folder already ends in one, and the database file name; an empty
 //     server gives the file name alone. The separator is "\" on Windows and "/" elsewhere.
 //   any other type: the empty text, which no connection accepts.
-// A null password counts as empty. Values go in as typed, except that a value which would break
-// the string is quoted (see odbcConnValue and oleDbConnValue). Pure.
+// A null password counts as empty. Values go in as typed, except that a user or password which
+// would break the string is quoted (see odbcConnValue and oleDbConnValue): a server or database
+// is kept as stored, since a shop may add a driver attribute there on purpose
+// ("myhost;Port=1433"). Pure.
 QString BuildConnString(const QString &server, const QString &user, const QString &password,
                         const QString &database, ConnectionKind kind);
 QString BuildConnString(const ConnectionParams &params);

@@ -4,6 +4,7 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QProcess>
+#include <QRegularExpression>
 #include <QTemporaryDir>
 #include <QTest>
 
@@ -105,6 +106,36 @@ private Q_SLOTS:
         QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/zo000002.htm"))));
         QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/tarnik.css"))));
         QVERIFY(!QDir(folder.filePath(QStringLiteral("shop/images"))).isEmpty());
+    }
+
+    // Stored numbers are read as the pages have always read them: a band that is no number is left
+    // out, a band of 100 is the whole height, a picture box of 0 gives no size attributes; only a
+    // grid that cannot be made is refused, with the field's name.
+    void catalogReadsStoredNumbersAsThePagesDo()
+    {
+        QTemporaryDir folder;
+        QVERIFY(folder.isValid());
+        const QString settings = folder.filePath(QStringLiteral("settings.ini"));
+        QByteArray demo = zorbin::test::readFile(
+            QDir(zorbin::test::demoFolder()).filePath(QStringLiteral("demo-settings.ini")));
+        const QByteArray output = "\nPagingPath=" + folder.filePath(QStringLiteral("out")).toUtf8() + "\n";
+        zorbin::test::writeFile(settings, demo + "\nTopPercent=abc\nBottomPercent=100\nImageW=0" + output);
+        const Run run =
+            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        QCOMPARE(run.exitCode, 0);
+        const QString first = folder.filePath(QStringLiteral("out/zoindex.htm"));
+        QCOMPARE(run.out.trimmed(), first);
+        const QString page = QString::fromLatin1(zorbin::test::readFile(first));
+        QVERIFY(!page.contains(QStringLiteral("class=Top1")));
+        QVERIFY(page.contains(QRegularExpression(QStringLiteral("<td colspan=\\d+ height='100%'>"))));
+        QVERIFY(page.contains(QStringLiteral("<img src=")));
+        QVERIFY(!page.contains(QRegularExpression(QStringLiteral("<img [^>]* height=\\d"))));
+
+        zorbin::test::writeFile(settings, demo + "\nRows=abc" + output);
+        const Run refused =
+            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        QCOMPARE(refused.exitCode, 1);
+        QVERIFY2(refused.err.contains(QStringLiteral("\"שורות\"")), qPrintable(refused.err));
     }
 
     // Each enabled step prints its statement once, in the order of a run; the password never shows.

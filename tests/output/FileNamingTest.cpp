@@ -149,6 +149,14 @@ private Q_SLOTS:
             << QStringLiteral("/תמונות/כיסא.png") << QStringLiteral("/תמונות/כיסא.png");
         QTest::newRow("windows path stays")
             << QStringLiteral("c:\\photos\\A12.JPG") << QStringLiteral("c:\\photos\\A12.JPG");
+        QTest::newRow("a URL keeps its query and fragment")
+            << QStringLiteral("http://host/p.php?id=5&s=1#x")
+            << QStringLiteral("http://host/p.php?id=5&amp;s=1#x");
+        QTest::newRow("a URL keeps its percent codes")
+            << QStringLiteral("https://cdn.example/l'or%20a.png")
+            << QStringLiteral("https://cdn.example/l&#39;or%20a.png");
+        QTest::newRow("a colon alone is no scheme")
+            << QStringLiteral("/p/a:b?.png") << QStringLiteral("/p/a:b%3F.png");
     }
 
     void fileReferences()

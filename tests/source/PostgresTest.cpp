@@ -2,7 +2,7 @@
 #include "model/CatalogSettings.h"
 #include "source/ChoiceLists.h"
 #include "source/ConnectionString.h"
-#include "source/LogonForm.h"
+#include "dialogs/LogonForm.h"
 #include "source/SourceConnection.h"
 #include "testutil/TestMain.h"
 

@@ -1,4 +1,4 @@
-#include "source/LogonForm.h"
+#include "dialogs/LogonForm.h"
 
 #include "common/Numbers.h"
 #include "model/SettingsPersistence.h"
