@@ -12,7 +12,7 @@ packages=(
     # the demo database and its pictures
     sqlite3 imagemagick
     # tests: a PostgreSQL server behind the ODBC driver, a virtual display, a real browser, fuzzing
-    postgresql xvfb xauth chromium clang libclang-rt-14-dev
+    postgresql xvfb xauth chromium clang clang-format libclang-rt-14-dev
     # the catalog's Hebrew fonts (David, Miriam) and a font for the settings page
     culmus fonts-dejavu-core
     # the Debian package (scripts/package.sh): CPack's dependency lookup, its checks, manual pages

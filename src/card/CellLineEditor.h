@@ -1,7 +1,7 @@
 #pragma once
 
-#include "model/CellLine.h"
 #include "card/FieldLabel.h"
+#include "model/CellLine.h"
 
 #include <QGroupBox>
 #include <array>

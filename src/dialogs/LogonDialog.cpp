@@ -1,7 +1,7 @@
 #include "dialogs/LogonDialog.h"
 
-#include "model/UserPort.h"
 #include "model/ConnectionParams.h"
+#include "model/UserPort.h"
 
 #include <QApplication>
 #include <QComboBox>

@@ -1,7 +1,7 @@
 #include "output/PageTemplate.h"
 
-#include "output/OutputFolder.h"
 #include "output/FileNaming.h"
+#include "output/OutputFolder.h"
 #include "output/PageLayout.h"
 #include "platform/Windows1255Writer.h"
 

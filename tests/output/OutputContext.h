@@ -1,10 +1,10 @@
 #pragma once
 
 #include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
 #include "platform/FileSystem.h"
-#include "model/ConnectionParams.h"
 #include "testutil/RecordingUserPort.h"
 
 namespace zorbin::test {

@@ -1,9 +1,9 @@
 #include "DemoExpectations.h"
 
+#include "dialogs/LogonForm.h"
 #include "model/CatalogSettings.h"
 #include "source/ChoiceLists.h"
 #include "source/ConnectionString.h"
-#include "dialogs/LogonForm.h"
 #include "source/SourceConnection.h"
 #include "source/SourceCriteria.h"
 #include "testutil/MemorySettingsStore.h"

@@ -1,8 +1,8 @@
 #include "DemoExpectations.h"
+#include "dialogs/LogonForm.h"
 #include "model/CatalogSettings.h"
 #include "source/ChoiceLists.h"
 #include "source/ConnectionString.h"
-#include "dialogs/LogonForm.h"
 #include "source/SourceConnection.h"
 #include "testutil/TestMain.h"
 
