@@ -15,6 +15,9 @@ packages=(
     postgresql xvfb xauth chromium clang libclang-rt-14-dev
     # the catalog's Hebrew fonts (David, Miriam) and a font for the settings page
     culmus fonts-dejavu-core
+    # the PDF catalog: Liberation Sans draws the pages' Arial (with its Hebrew letters); poppler-utils
+    # reads the PDF back in the tests
+    fonts-liberation2 poppler-utils
 )
 
 run() {

@@ -5,6 +5,9 @@
 #include "control/Statements.h"
 #include "control/CatalogControl.h"
 #include "control/Program.h"
+#include "model/SettingsValidation.h"
+#include "output/OutputFolder.h"
+#include "pdf/CatalogPdf.h"
 #include "platform/Browser.h"
 #include "platform/FileSystem.h"
 #include "platform/SettingsStore.h"
@@ -197,6 +200,83 @@ int demo(const QStringList &arguments)
     return runOutput(*store, request);
 }
 
+// The PDF run: collects (unless the items were marked by hand) and writes the catalog as a PDF.
+int pdf(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(QStringLiteral("Writes the catalog as a PDF file and prints its path."));
+    addRunOptions(parser);
+    parser.addOption({OutOption, QStringLiteral("The PDF file (default: zorbin.pdf in the output folder)."),
+                      QStringLiteral("FILE")});
+    const QString pageSizeOption = QStringLiteral("page-size");
+    parser.addOption({pageSizeOption, QStringLiteral("a4 (the default) or letter."), QStringLiteral("SIZE"),
+                      QStringLiteral("a4")});
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    const QString size = parser.value(pageSizeOption).toLower();
+    if (size != QLatin1String("a4") && size != QLatin1String("letter")) {
+        err() << "The page size is a4 or letter, not " << parser.value(pageSizeOption) << ".\n";
+        return UsageError;
+    }
+    auto store = openStore(parser);
+    std::unique_ptr<Browser> browser = parser.isSet(OpenOption) ? makeSystemBrowser() : nullptr;
+    CliUserPort user(browser.get());
+    CatalogControl control(user, *store, localFileSystem());
+    control.UserControl_Initialize();
+    CatalogSettings &settings = control.settings();
+    const bool useMarked = parser.isSet(UseMarkedOption);
+    if (useMarked) {
+        settings.ChkSelectAccount = CheckValue::Checked;
+        control.runState().WorkDBFile = lastWorkDatabase();
+    }
+    if (parser.isSet(OnlyWithPictureOption))
+        settings.ChkOnlyWithPic = CheckValue::Checked;
+    if (const Status valid = validateNumericSettings(settings); !valid) {
+        err() << valid.description() << '\n';
+        return Failure;
+    }
+    if (!useMarked) {
+        if (const Status collected = control.collect(); !collected) {
+            err() << collected.description() << '\n';
+            return Failure;
+        }
+    }
+    const RunState &state = control.runState();
+    if (state.WorkDBFile.isEmpty()) {
+        err() << "There is no working database: run without --use-marked first.\n";
+        return Failure;
+    }
+    QString file = parser.value(OutOption);
+    if (file.isEmpty()) {
+        const QString folder = outputFolderOf(settings);
+        if (const Status made = ensureFolder(localFileSystem(), folder); !made) {
+            err() << made.description() << '\n';
+            return Failure;
+        }
+        file = folder + QStringLiteral("zorbin.pdf");
+    }
+    const PdfPageSize pageSize = size == QLatin1String("letter") ? PdfPageSize::Letter : PdfPageSize::A4;
+    const Result<PdfWritten> written =
+        CreateCatPDF(control.context(), {QFileInfo(file).absoluteFilePath(), state.WorkDBFile, pageSize});
+    if (!written) {
+        err() << written.status().description() << '\n';
+        return Failure;
+    }
+    if (written->ending != PdfWritten::Ending::Written) {
+        err() << "The catalog has no items: no PDF was written.\n";
+        return state.CollectFailed ? Failure : EmptyCatalog;
+    }
+    out() << QDir::toNativeSeparators(written->file) << '\n';
+    out().flush();
+    if (browser) {
+        if (const Status opened = user.openBrowser(written->file); !opened)
+            err() << opened.description() << '\n';
+    }
+    return state.CollectFailed ? Failure : Success;
+}
+
 int sql(const QStringList &arguments)
 {
     QCommandLineParser parser;
@@ -232,6 +312,7 @@ QString overview()
                           "Commands:\n"
                           "  catalog   write the catalog and print the path of its first page\n"
                           "  list      write the plain item list and print its path\n"
+                          "  pdf       write the catalog as a PDF file and print its path\n"
                           "  demo      write the catalog of the bundled demo database\n"
                           "  sql       print every statement a run would send\n"
                           "\n"
@@ -244,6 +325,8 @@ int run(const QString &command, const QStringList &arguments)
         return catalogOrList(true, arguments);
     if (command == QLatin1String("list"))
         return catalogOrList(false, arguments);
+    if (command == QLatin1String("pdf"))
+        return pdf(arguments);
     if (command == QLatin1String("demo"))
         return demo(arguments);
     if (command == QLatin1String("sql"))
