@@ -8,6 +8,7 @@
 #include <QPaintDevice>
 #include <QPainter>
 #include <algorithm>
+#include <cmath>
 
 namespace zorbin {
 namespace {
@@ -52,7 +53,9 @@ PdfCell::PdfCell(const PdfLayout &layout, const CatalogRows &rows, QPaintDevice 
                        ? std::max(m_content.width() - besideWidth - BesideGapPoints * m_units, m_units)
                        : m_content.width();
 
-    // Captions: one column as wide as the widest caption, at most 45% of the lines' width.
+    // Captions: one column as wide as the widest caption, at most 45% of the lines' width. They
+    // are measured on a line far wider than any page (and within Qt's fixed-point range).
+    const double unbounded = 1e6;
     double widest = 0;
     for (const PdfLine &line : layout.lines) {
         Line prepared;
@@ -65,9 +68,9 @@ PdfCell::PdfCell(const PdfLayout &layout, const CatalogRows &rows, QPaintDevice 
         prepared.beside = line.field == PictureField && layout.pictureBeside;
         const QString caption = captionText(line.caption);
         if (!caption.isEmpty())
-            widest = std::max(
-                widest, PdfText(caption, prepared.font, &device, Qt::RightToLeft, line.format.align, 1e9)
-                            .naturalWidth());
+            widest = std::max(widest, PdfText(caption, prepared.font, &device, Qt::RightToLeft,
+                                              line.format.align, unbounded)
+                                          .naturalWidth());
         m_lines.push_back(std::move(prepared));
     }
     if (widest > 0) {

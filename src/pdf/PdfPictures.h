@@ -1,9 +1,9 @@
 #pragma once
 
-#include <QHash>
 #include <QImage>
 #include <QSizeF>
 #include <QString>
+#include <map>
 
 namespace zorbin {
 
@@ -31,7 +31,8 @@ public:
     // `box` is the largest box, in points, that a picture is drawn in during the run.
     PdfPictures(const FileSystem &files, QSizeF box, double dotsPerInch = 300);
 
-    // The picture of a file; null when there is none.
+    // The picture of a file; null when there is none. The picture stays where it is as long as
+    // the object lives.
     const PdfPicture *picture(const QString &file);
 
     int decoded() const { return m_decoded; }
@@ -40,7 +41,7 @@ private:
     const FileSystem &m_files;
     QSizeF m_box;
     double m_dotsPerInch;
-    QHash<QString, PdfPicture> m_pictures; // a null image for a file that gave none
+    std::map<QString, PdfPicture> m_pictures; // a null image for a file that gave none
     int m_decoded = 0;
 };
 

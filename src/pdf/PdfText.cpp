@@ -9,23 +9,23 @@
 
 namespace zorbin {
 
-QString familyOf(PdfFace face)
+QStringList familiesOf(PdfFace face)
 {
     switch (face) {
     case PdfFace::David:
-        return QStringLiteral("David CLM");
+        return {QStringLiteral("David CLM"), QStringLiteral("David")};
     case PdfFace::Miriam:
-        return QStringLiteral("Miriam CLM");
+        return {QStringLiteral("Miriam CLM"), QStringLiteral("Miriam")};
     case PdfFace::Arial:
         break;
     }
-    return QStringLiteral("Liberation Sans");
+    return {QStringLiteral("Liberation Sans"), QStringLiteral("Arial")};
 }
 
 QFont pdfFont(const PdfTextFormat &format)
 {
     QFont font;
-    font.setFamilies({familyOf(format.face), FallbackFamily});
+    font.setFamilies(familiesOf(format.face) << FallbackFamily);
     font.setPointSizeF(std::max(1.0, format.points));
     font.setWeight(format.weight == PdfWeight::Normal ? QFont::Normal : QFont::Bold);
     font.setItalic(format.italic);

@@ -14,15 +14,16 @@ class QTextLayout;
 
 namespace zorbin {
 
-// The installed family that draws each of the catalog's faces. The pages name "Arial (Hebrew)",
-// "David" and "Miriam"; on Debian these are Liberation Sans (metric-compatible with Arial, with
-// Hebrew letters; package fonts-liberation2), David CLM and Miriam CLM (package culmus).
-QString familyOf(PdfFace face);
+// The families that draw each of the catalog's faces, the first installed one drawing. The pages
+// name "Arial (Hebrew)", "David" and "Miriam"; on Debian these are Liberation Sans (metric-
+// compatible with Arial, with Hebrew letters; package fonts-liberation2), David CLM and Miriam CLM
+// (package culmus); where those are missing (Windows), Arial, David and Miriam themselves.
+QStringList familiesOf(PdfFace face);
 // The family that every line falls back to for characters its own face lacks (the culmus faces
 // have few Latin letters and no Latin punctuation of some kinds): DejaVu Sans, which has them.
 inline const QString FallbackFamily = QStringLiteral("DejaVu Sans");
 
-// The font of a format: its family, then the fallback; the weights Bolder and Bold both draw bold
+// The font of a format: its families, then the fallback; the weights Bolder and Bold both draw bold
 // (as a browser draws "bolder" on normal text); sizes below 1 point are drawn at 1 point.
 QFont pdfFont(const PdfTextFormat &format);
 
