@@ -6,6 +6,7 @@
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
 
+#include <QColor>
 #include <QDir>
 #include <QImage>
 #include <QSet>
@@ -106,6 +107,35 @@ private Q_SLOTS:
         QVERIFY(!flat.isNull());
         QVERIFY(near(flat.pixel(20, 100), qRgb(255, 255, 255)));
         QVERIFY(near(flat.pixel(280, 100), qRgb(0, 192, 0)));
+    }
+
+    // Many distinct pictures, each shown twice: every one stored once and drawn from where it was
+    // kept (a cache that moved its pictures as it grew drew freed memory).
+    void manyPicturesEachStoredOnce()
+    {
+        const QString database = m_folder.filePath(QStringLiteral("many.db"));
+        WorkRows rows;
+        for (int i = 0; i < 128; ++i) {
+            const QString file = m_folder.filePath(QStringLiteral("many%1.png").arg(i % 64));
+            QImage image(40 + i % 64, 30, QImage::Format_RGB32);
+            image.fill(QColor::fromHsv(i % 64 * 5, 200, 200));
+            QVERIFY(i >= 64 || image.save(file));
+            WorkItem item(QStringLiteral("M%1").arg(i, 3, 10, QLatin1Char('0')));
+            item.picture = file;
+            rows.items << item;
+        }
+        QVERIFY(makeWorkDatabase(database, rows));
+        PdfRig rig;
+        const QString pdf = m_folder.filePath(QStringLiteral("many.pdf"));
+        const Result<PdfWritten> written = write(rig, pdf, database);
+        QVERIFY(written);
+        QCOMPARE(written->picturesDecoded, 64);
+        QSet<int> objects;
+        const QList<ImageRow> images = pdfImages(pdf);
+        for (const ImageRow &image : images)
+            objects.insert(image.object);
+        QCOMPARE(images.size(), 128);
+        QCOMPARE(objects.size(), 64);
     }
 
     // A stop keeps the older file as it was and leaves nothing else behind.
