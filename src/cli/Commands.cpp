@@ -264,9 +264,13 @@ int pdf(const QStringList &arguments)
         err() << written.status().description() << '\n';
         return Failure;
     }
-    if (written->ending != PdfWritten::Ending::Written) {
+    if (written->ending == PdfWritten::Ending::NoItems) {
         err() << "The catalog has no items: no PDF was written.\n";
         return state.CollectFailed ? Failure : EmptyCatalog;
+    }
+    if (written->ending == PdfWritten::Ending::Stopped) {
+        err() << "The run was stopped: no PDF was written.\n";
+        return Failure;
     }
     out() << QDir::toNativeSeparators(written->file) << '\n';
     out().flush();
