@@ -216,9 +216,9 @@ int main(int argc, char *argv[])
         "PDF: %lld pages in %.2f s = %.0f pages/s (processor time %.2f s); %.1f MB; peak memory %.1f MB\n",
         written->pages, seconds, written->pages / seconds, cpu, megabytes, peakKb / 1024.0);
     std::printf(
-        "  %d picture files decoded (each once); %d image objects stored for %d distinct pictures and "
-        "the logo\n",
-        written->picturesDecoded, storedImages(pdf), pictureCount);
+        "  %d picture files decoded (each once), at most %d kept at once; %d image objects stored for %d "
+        "distinct pictures and the logo\n",
+        written->picturesDecoded, written->picturesHeldAtMost, storedImages(pdf), pictureCount);
     std::printf("  goals: under 30 s (%s), under 300 MB (%s)\n", seconds < 30 ? "met" : "missed",
                 peakKb / 1024.0 < 300 ? "met" : "missed");
     return 0;

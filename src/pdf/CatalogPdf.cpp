@@ -1,5 +1,6 @@
 #include "pdf/CatalogPdf.h"
 
+#include "model/CatalogField.h"
 #include "model/ProgressMeter.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
@@ -150,9 +151,10 @@ private:
 class PdfRun
 {
 public:
-    PdfRun(RunContext &context, const PdfRequest &request, const PdfLayout &layout, CatalogRows &rows)
+    PdfRun(RunContext &context, const PdfRequest &request, const PdfLayout &layout, CatalogRows &rows,
+           QHash<QString, int> pictureUses)
         : m_context(context), m_request(request), m_layout(layout), m_rows(rows),
-          m_meter(context.user, context.state)
+          m_pictureUses(std::move(pictureUses)), m_meter(context.user, context.state)
     {
         const long long cellsPerPage = layout.cellsPerPage();
         m_pageCount = (rows.count() + cellsPerPage - 1) / cellsPerPage;
@@ -188,13 +190,14 @@ public:
             file.cancelWriting(); // the temporary file goes; an older file stays as it was
             if (!drawn)
                 return drawn.status();
-            return PdfWritten{PdfWritten::Ending::Stopped, {}, 0, m_picturesDecoded};
+            return PdfWritten{PdfWritten::Ending::Stopped, {}, 0, m_picturesDecoded, m_picturesHeld};
         }
         if (!file.commit())
             return Status::fault(QStringLiteral("לא ניתן לכתוב את הקובץ %1: %2")
                                      .arg(QDir::toNativeSeparators(m_request.file), file.errorString()));
         m_meter.reset();
-        return PdfWritten{PdfWritten::Ending::Written, m_request.file, m_pageCount, m_picturesDecoded};
+        return PdfWritten{PdfWritten::Ending::Written, m_request.file, m_pageCount, m_picturesDecoded,
+                          m_picturesHeld};
     }
 
 private:
@@ -206,7 +209,7 @@ private:
                          m_layout.rows, m_layout.columns);
         Bands bands(m_layout, page, writer, m_context.files);
         PdfCell cell(m_layout, m_rows, writer, m_context.files, page.cellSize(), UnitsPerPoint,
-                     Separators::ofSystem());
+                     Separators::ofSystem(), std::move(m_pictureUses));
         QPen frame(Qt::black);
         frame.setWidthF(0.5 * UnitsPerPoint);
         painter.setPen(Qt::black);
@@ -234,12 +237,14 @@ private:
                     ++cellsDone;
                     if (m_meter.tick(cellsDone, m_cellCount)) {
                         m_picturesDecoded = cell.picturesDecoded();
+                        m_picturesHeld = cell.picturesHeldAtMost();
                         return false;
                     }
                 }
             }
         }
         m_picturesDecoded = cell.picturesDecoded();
+        m_picturesHeld = cell.picturesHeldAtMost();
         return true;
     }
 
@@ -266,11 +271,37 @@ private:
     const PdfRequest &m_request;
     const PdfLayout &m_layout;
     CatalogRows &m_rows;
+    QHash<QString, int> m_pictureUses;
     ProgressMeter m_meter;
     long long m_pageCount = 0;
     long long m_cellCount = 0;
     int m_picturesDecoded = 0;
+    int m_picturesHeld = 0;
 };
+
+// How many items show each picture reference: a first pass over the rows, so that each picture
+// can be let go after its last item and memory does not grow with the number of pictures.
+// Empty when no line shows the picture.
+Result<QHash<QString, int>> pictureUses(RunContext &context, const PdfRequest &request,
+                                        const PdfLayout &layout)
+{
+    QHash<QString, int> uses;
+    const auto line = std::find_if(layout.lines.cbegin(), layout.lines.cend(),
+                                   [](const PdfLine &used) { return used.field == PictureField; });
+    if (line == layout.lines.cend())
+        return uses;
+    Result<std::unique_ptr<CatalogRows>> rows = openPdfRows(request.dbFile, context.settings);
+    if (!rows)
+        return rows.status();
+    const int column = rows.value()->column(line->column);
+    while (rows.value()->next()) {
+        const QVariant value = rows.value()->value(column);
+        ++uses[value.isNull() ? QString() : value.toString()];
+    }
+    if (!rows.value()->status())
+        return rows.value()->status();
+    return uses;
+}
 
 } // namespace
 
@@ -286,9 +317,12 @@ Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request)
     if (!rows)
         return rows.status();
     if (rows.value()->count() == 0)
-        return PdfWritten{PdfWritten::Ending::NoItems, {}, 0, 0};
+        return PdfWritten{PdfWritten::Ending::NoItems, {}, 0, 0, 0};
+    Result<QHash<QString, int>> uses = pictureUses(context, request, layout.value());
+    if (!uses)
+        return uses.status();
     keepLargeBuffersInHeap();
-    PdfRun run(context, request, layout.value(), *rows.value());
+    PdfRun run(context, request, layout.value(), *rows.value(), std::move(uses).value());
     return run.run();
 }
 

@@ -27,9 +27,10 @@ struct PdfWritten
         Stopped, // the stop request ended the run: nothing was written, an older file is untouched
     };
     Ending ending = Ending::Written;
-    QString file;            // the written file; empty unless Written
-    long long pages = 0;     // pages written (Written only)
-    int picturesDecoded = 0; // distinct picture files decoded (each at most once a run)
+    QString file;               // the written file; empty unless Written
+    long long pages = 0;        // pages written (Written only)
+    int picturesDecoded = 0;    // distinct picture files decoded (each at most once a run)
+    int picturesHeldAtMost = 0; // the most pictures kept decoded at once (each until its last item)
 };
 
 // Writes the catalog of `request.dbFile` under `context.settings` as a PDF into `request.file`:

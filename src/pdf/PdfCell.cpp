@@ -31,9 +31,10 @@ QString captionText(const QString &typed)
 } // namespace
 
 PdfCell::PdfCell(const PdfLayout &layout, const CatalogRows &rows, QPaintDevice &device,
-                 const FileSystem &files, const QSizeF &cellSize, double unitsPerPoint, Separators separators)
+                 const FileSystem &files, const QSizeF &cellSize, double unitsPerPoint, Separators separators,
+                 QHash<QString, int> pictureUses)
     : m_layout(layout), m_rows(rows), m_device(device), m_files(files), m_units(unitsPerPoint),
-      m_separators(std::move(separators))
+      m_separators(std::move(separators)), m_pictureUses(std::move(pictureUses))
 {
     m_padding = PaddingPoints * m_units;
     m_content = QSizeF(std::max(cellSize.width() - 2 * m_padding, m_units),
@@ -126,18 +127,32 @@ Result<QString> PdfCell::valueText(const Line &line) const
     return value.isNull() ? QString() : value.toString();
 }
 
-const PdfPicture *PdfCell::pictureOf(const Line &line)
+QString PdfCell::pictureFile(const Line &line)
 {
     const QVariant value = m_rows.value(line.value);
     const QString reference = value.isNull() ? QString() : value.toString();
     if (!namesPicture(reference))
-        return nullptr;
+        return {};
     auto known = m_references.constFind(reference);
     if (known == m_references.cend()) {
-        const std::optional<QString> file = pictureSourceFile(m_files, reference);
-        known = m_references.insert(reference, file ? m_pictures->picture(*file) : nullptr);
+        const QString file = pictureSourceFile(m_files, reference).value_or(QString());
+        known = m_references.insert(reference, file);
+        if (!file.isEmpty())
+            m_fileUses[file] += m_pictureUses.value(reference, 1);
     }
     return known.value();
+}
+
+// After the last item that shows it, a picture is let go. (Two spellings of one file that are
+// far apart may have it decoded, and stored, a second time.)
+void PdfCell::drawnOnce(const QString &file)
+{
+    if (file.isEmpty() || m_pictureUses.isEmpty())
+        return;
+    if (--m_fileUses[file] <= 0) {
+        m_fileUses.remove(file);
+        m_pictures->release(file);
+    }
 }
 
 double PdfCell::alignedX(PdfAlign align, double left, double width, double drawn) const
@@ -162,6 +177,7 @@ Status PdfCell::draw(QPainter &painter, const QRectF &cell)
 
     // Lay the values out first: the picture gets what the text leaves.
     double textHeight = 0;
+    QString file; // the picture's
     const PdfPicture *picture = nullptr;
     const Line *pictureLine = nullptr;
     for (std::size_t n = 0; n < m_lines.size(); ++n) {
@@ -170,7 +186,10 @@ Status PdfCell::draw(QPainter &painter, const QRectF &cell)
         drawn.value = PdfText();
         drawn.height = 0;
         if (line.picture || line.beside) {
-            picture = pictureOf(line);
+            if (!pictureLine) {
+                file = pictureFile(line);
+                picture = file.isEmpty() ? nullptr : m_pictures->picture(file);
+            }
             pictureLine = &line;
             if (line.beside && !line.caption.isEmpty())
                 drawn.height = line.minHeight;
@@ -240,6 +259,7 @@ Status PdfCell::draw(QPainter &painter, const QRectF &cell)
 
     if (overflows)
         painter.restore();
+    drawnOnce(file);
     return Status::ok();
 }
 

@@ -30,14 +30,18 @@ class PdfCell
 {
 public:
     // `layout`, `rows`, `device` and `files` must outlive the object. `cellSize` is the size of
-    // every grid cell; `unitsPerPoint` the device's units in a point.
+    // every grid cell; `unitsPerPoint` the device's units in a point. `pictureUses` says how many
+    // items show each picture reference, so that a picture is let go after its last item; when
+    // it is empty, every picture is kept to the end of the run.
     PdfCell(const PdfLayout &layout, const CatalogRows &rows, QPaintDevice &device, const FileSystem &files,
-            const QSizeF &cellSize, double unitsPerPoint, Separators separators);
+            const QSizeF &cellSize, double unitsPerPoint, Separators separators,
+            QHash<QString, int> pictureUses = {});
 
     // Draws the rows' current item into `cell`. Fails when a price is not a number.
     Status draw(QPainter &painter, const QRectF &cell);
 
     int picturesDecoded() const { return m_pictures->decoded(); }
+    int picturesHeldAtMost() const { return m_pictures->heldAtMost(); }
 
 private:
     struct Line
@@ -58,7 +62,8 @@ private:
     };
 
     Result<QString> valueText(const Line &line) const;
-    const PdfPicture *pictureOf(const Line &line);
+    QString pictureFile(const Line &line);
+    void drawnOnce(const QString &file);
     double alignedX(PdfAlign align, double left, double width, double drawn) const;
     double valueWidth(const Line &line) const;
 
@@ -79,7 +84,9 @@ private:
     std::vector<Line> m_lines;
     std::vector<Drawn> m_drawn; // per line, reused from cell to cell
     std::optional<PdfPictures> m_pictures;
-    QHash<QString, const PdfPicture *> m_references; // picture reference -> picture (null: none)
+    QHash<QString, QString> m_references; // picture reference -> its file (empty: none)
+    QHash<QString, int> m_pictureUses;    // picture reference -> items that show it
+    QHash<QString, int> m_fileUses;       // picture file -> items still to show it
 };
 
 } // namespace zorbin

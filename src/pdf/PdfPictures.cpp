@@ -52,6 +52,11 @@ PdfPicture decode(QIODevice &device, const QSizeF &box, double dotsPerInch)
 
 } // namespace
 
+void PdfPictures::release(const QString &file)
+{
+    m_pictures.erase(file);
+}
+
 QSizeF fittedSize(const QSizeF &natural, const QSizeF &box)
 {
     if (natural.isEmpty() || box.isEmpty())
@@ -74,6 +79,7 @@ const PdfPicture *PdfPictures::picture(const QString &file)
             picture = decode(*device.value(), m_box, m_dotsPerInch);
         }
         known = m_pictures.emplace(file, std::move(picture)).first;
+        m_heldAtMost = std::max(m_heldAtMost, static_cast<int>(m_pictures.size()));
     }
     return known->second.image.isNull() ? nullptr : &known->second;
 }

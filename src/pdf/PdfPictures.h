@@ -23,8 +23,8 @@ QSizeF fittedSize(const QSizeF &natural, const QSizeF &box);
 // The pictures of one PDF run. Each distinct file is decoded once, upright (EXIF orientation
 // applied), scaled while decoding to the largest box it is drawn in at `dotsPerInch` (never
 // above its own pixels), flattened on white, and kept: drawing the one kept image each time lets
-// the PDF hold it once however many items show it. A file that is missing or cannot be decoded
-// gives no picture, once, and is not tried again.
+// the PDF hold it once however many items show it, until the run lets it go after its last item.
+// A file that is missing or cannot be decoded gives no picture, once, and is not tried again.
 class PdfPictures
 {
 public:
@@ -35,7 +35,12 @@ public:
     // the object lives.
     const PdfPicture *picture(const QString &file);
 
+    // Lets a file's picture go: the run will not draw it again.
+    void release(const QString &file);
+
     int decoded() const { return m_decoded; }
+    // The most pictures kept at once.
+    int heldAtMost() const { return m_heldAtMost; }
 
 private:
     const FileSystem &m_files;
@@ -43,6 +48,7 @@ private:
     double m_dotsPerInch;
     std::map<QString, PdfPicture> m_pictures; // a null image for a file that gave none
     int m_decoded = 0;
+    int m_heldAtMost = 0;
 };
 
 } // namespace zorbin

@@ -75,7 +75,8 @@ private Q_SLOTS:
         const Result<PdfWritten> written = write(rig, pdf, m_database);
         QVERIFY2(written, qPrintable(written.status().description()));
         QCOMPARE(written->pages, 1);
-        QCOMPARE(written->picturesDecoded, 3); // the photograph, the PNG, the broken file; each once
+        QCOMPARE(written->picturesDecoded, 3);    // the photograph, the PNG, the broken file; each once
+        QCOMPARE(written->picturesHeldAtMost, 2); // each let go after its last item
 
         // Four pictures drawn (three items show the photograph), two stored, no transparency left.
         const QList<ImageRow> images = pdfImages(pdf);
@@ -109,8 +110,9 @@ private Q_SLOTS:
         QVERIFY(near(flat.pixel(280, 100), qRgb(0, 192, 0)));
     }
 
-    // Many distinct pictures, each shown twice: every one stored once and drawn from where it was
-    // kept (a cache that moved its pictures as it grew drew freed memory).
+    // Many distinct pictures, each shown twice, half the catalog apart, so that all are kept at
+    // once: every one decoded and stored once, drawn from where it was kept (a cache that moved
+    // its pictures as it grew drew freed memory).
     void manyPicturesEachStoredOnce()
     {
         const QString database = m_folder.filePath(QStringLiteral("many.db"));
@@ -130,6 +132,7 @@ private Q_SLOTS:
         const Result<PdfWritten> written = write(rig, pdf, database);
         QVERIFY(written);
         QCOMPARE(written->picturesDecoded, 64);
+        QCOMPARE(written->picturesHeldAtMost, 64);
         QSet<int> objects;
         const QList<ImageRow> images = pdfImages(pdf);
         for (const ImageRow &image : images)
