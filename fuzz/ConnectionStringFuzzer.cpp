@@ -20,7 +20,8 @@ void require(bool condition)
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t *data, std::size_t size)
 {
     using namespace zorbin;
-    const QString text = QString::fromUtf8(reinterpret_cast<const char *>(data), static_cast<qsizetype>(size));
+    const QString text =
+        QString::fromUtf8(reinterpret_cast<const char *>(data), static_cast<qsizetype>(size));
 
     for (const ConnectionPart &part : splitConnString(text)) {
         require(part.valueStart >= 0 && part.valueLength >= 0);
@@ -33,14 +34,15 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t *data, std::size_t size
     const qsizetype cut = text.indexOf(QLatin1Char('\n'));
     const QString user = cut < 0 ? text : text.left(cut);
     const QString password = cut < 0 ? QString() : text.mid(cut + 1);
-    const QString odbc = BuildConnString(QStringLiteral("srv"), user, password, QStringLiteral("db"), ConnectionKind::Odbc);
+    const QString odbc =
+        BuildConnString(QStringLiteral("srv"), user, password, QStringLiteral("db"), ConnectionKind::Odbc);
     require(connStringValue(odbc, QStringLiteral("uid")) == user);
     require(connStringValue(odbc, QStringLiteral("pwd")) == password);
     require(connStringValue(odbc, QStringLiteral("database")) == QLatin1String("db"));
 
     // OLE DB trims a value that is not quoted, as its providers do.
-    const QString oleDb = BuildConnString(QStringLiteral("srv"), QStringLiteral("u"), password, QStringLiteral("db"),
-                                          ConnectionKind::OleDb);
+    const QString oleDb = BuildConnString(QStringLiteral("srv"), QStringLiteral("u"), password,
+                                          QStringLiteral("db"), ConnectionKind::OleDb);
     const QString expected = oleDbConnValue(password) == password ? password.trimmed() : password;
     require(connStringValue(oleDb, QStringLiteral("Password")) == expected);
     require(connStringValue(oleDb, QStringLiteral("Initial Catalog")) == QLatin1String("db"));

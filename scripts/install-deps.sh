@@ -17,6 +17,9 @@ packages=(
     culmus fonts-dejavu-core
     # the Debian package (scripts/package.sh): CPack's dependency lookup, its checks, manual pages
     dpkg-dev file lintian appstream man-db
+    # the PDF catalog: Liberation Sans draws the pages' Arial (with its Hebrew letters); poppler-utils
+    # reads the PDF back in the tests
+    fonts-liberation2 poppler-utils
 )
 
 run() {

@@ -81,6 +81,7 @@ QLayout *MainCard::buildCommands()
     };
     m_cmdRunMailing = button("cmdRunMailing", QStringLiteral("הצג קטלוג"));
     m_CmdPreview = button("CmdPreview", QStringLiteral("הצג רשימה"));
+    m_cmdRunPdf = button("cmdRunPdf", QStringLiteral("הצג PDF"));
     m_cmdStop = button("cmdStop", QStringLiteral("עצור"));
     m_CmdDef = button("CmdDef", QStringLiteral("שמור הגדרות"));
     m_cmdRunMailing->setDefault(true);
@@ -88,12 +89,14 @@ QLayout *MainCard::buildCommands()
 
     connect(m_cmdRunMailing, &QPushButton::clicked, this, &MainCard::cmdRunMailing_Click);
     connect(m_CmdPreview, &QPushButton::clicked, this, &MainCard::CmdPreview_Click);
+    connect(m_cmdRunPdf, &QPushButton::clicked, this, &MainCard::cmdRunPdf_Click);
     connect(m_cmdStop, &QPushButton::clicked, this, &MainCard::cmdStop_Click);
     connect(m_CmdDef, &QPushButton::clicked, this, &MainCard::CmdDef_Click);
 
     auto *buttons = new QHBoxLayout;
     buttons->addWidget(m_cmdRunMailing);
     buttons->addWidget(m_CmdPreview);
+    buttons->addWidget(m_cmdRunPdf);
     buttons->addWidget(m_cmdStop);
     buttons->addStretch();
     buttons->addWidget(m_CmdDef);
@@ -108,6 +111,11 @@ void MainCard::cmdRunMailing_Click()
 void MainCard::CmdPreview_Click()
 {
     m_control.askAndMakeList();
+}
+
+void MainCard::cmdRunPdf_Click()
+{
+    m_control.askAndMakePdf();
 }
 
 void MainCard::cmdStop_Click()
@@ -134,6 +142,7 @@ void MainCard::setBusy(bool busy)
 {
     m_cmdRunMailing->setEnabled(!busy);
     m_CmdPreview->setEnabled(!busy);
+    m_cmdRunPdf->setEnabled(!busy);
     m_CmdDef->setEnabled(!busy);
     m_cmdStop->setEnabled(busy);
     // The runs read the settings as they go: they stay as they were until the run ends.

@@ -67,6 +67,7 @@ Q_SIGNALS:
 private Q_SLOTS:
     void cmdRunMailing_Click();
     void CmdPreview_Click();
+    void cmdRunPdf_Click();
     void cmdStop_Click();
     void CmdDef_Click();
 
@@ -82,6 +83,7 @@ private:
     GeneralTab *m_generalTab = nullptr;
     QPushButton *m_cmdRunMailing = nullptr;
     QPushButton *m_CmdPreview = nullptr;
+    QPushButton *m_cmdRunPdf = nullptr;
     QPushButton *m_cmdStop = nullptr;
     QPushButton *m_CmdDef = nullptr;
     QLabel *m_Message1 = nullptr;

@@ -112,26 +112,30 @@ int finish(const RunOutcome &outcome)
     return Failure;
 }
 
-// What a catalog or list command asks for.
+// What a run command asks for.
 struct RunRequest
 {
-    bool catalog = true;
+    enum class Output { Catalog, List, Pdf };
+    Output output = Output::Catalog;
     bool useMarked = false;
     bool onlyWithPicture = false;
     bool open = false;
     QString outputFolder; // empty: the settings' own
+    QString file;         // the PDF: empty for the one in the output folder
+    PdfPageSize pageSize = PdfPageSize::A4;
 };
 
-RunRequest requestOf(bool catalog, const QCommandLineParser &parser)
+RunRequest requestOf(RunRequest::Output output, const QCommandLineParser &parser)
 {
-    return {catalog,
-            parser.isSet(UseMarkedOption),
-            parser.isSet(OnlyWithPictureOption),
-            parser.isSet(OpenOption),
-            {}};
+    RunRequest request;
+    request.output = output;
+    request.useMarked = parser.isSet(UseMarkedOption);
+    request.onlyWithPicture = parser.isSet(OnlyWithPictureOption);
+    request.open = parser.isSet(OpenOption);
+    return request;
 }
 
-// The catalog or list run on the given store.
+// The run on the given store.
 int runOutput(SettingsStore &store, const RunRequest &request)
 {
     std::unique_ptr<Browser> browser = request.open ? makeSystemBrowser() : nullptr;
@@ -145,22 +149,31 @@ int runOutput(SettingsStore &store, const RunRequest &request)
         settings.onlyWithPicture = true;
     if (!request.outputFolder.isEmpty())
         settings.outputFolder = request.outputFolder;
-    return finish(request.catalog ? control->makeCatalog() : control->makeList(!request.useMarked));
+    switch (request.output) {
+    case RunRequest::Output::Catalog:
+        return finish(control->makeCatalog());
+    case RunRequest::Output::List:
+        return finish(control->makeList(!request.useMarked));
+    case RunRequest::Output::Pdf:
+        return finish(control->makePdf(request.pageSize, request.file));
+    }
+    return Failure;
 }
 
-int catalogOrList(bool catalog, const QStringList &arguments)
+int catalogOrList(RunRequest::Output output, const QStringList &arguments)
 {
     QCommandLineParser parser;
     parser.setApplicationDescription(
-        catalog ? QStringLiteral("Writes the catalog and prints the path of its first page.")
-                : QStringLiteral("Writes the item list page and prints its path."));
+        output == RunRequest::Output::Catalog
+            ? QStringLiteral("Writes the catalog and prints the path of its first page.")
+            : QStringLiteral("Writes the item list page and prints its path."));
     addRunOptions(parser);
     if (const auto exit = parse(parser, arguments))
         return *exit;
     if (const auto exit = checkSettingsFile(parser))
         return *exit;
     auto store = openStore(parser);
-    return runOutput(*store, requestOf(catalog, parser));
+    return runOutput(*store, requestOf(output, parser));
 }
 
 int demo(const QStringList &arguments)
@@ -188,6 +201,34 @@ int demo(const QStringList &arguments)
     RunRequest request;
     request.open = parser.isSet(OpenOption);
     request.outputFolder = QDir::toNativeSeparators(folder);
+    return runOutput(*store, request);
+}
+
+// The PDF run: collects (unless the items were marked by hand) and writes the catalog as a PDF.
+int pdf(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(QStringLiteral("Writes the catalog as a PDF file and prints its path."));
+    addRunOptions(parser);
+    parser.addOption({OutOption, QStringLiteral("The PDF file (default: zorbin.pdf in the output folder)."),
+                      QStringLiteral("FILE")});
+    const QString pageSizeOption = QStringLiteral("page-size");
+    parser.addOption({pageSizeOption, QStringLiteral("a4 (the default) or letter."), QStringLiteral("SIZE"),
+                      QStringLiteral("a4")});
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    const QString size = parser.value(pageSizeOption).toLower();
+    if (size != QLatin1String("a4") && size != QLatin1String("letter")) {
+        err() << "The page size is a4 or letter, not " << parser.value(pageSizeOption) << ".\n";
+        return UsageError;
+    }
+    RunRequest request = requestOf(RunRequest::Output::Pdf, parser);
+    request.pageSize = size == QLatin1String("letter") ? PdfPageSize::Letter : PdfPageSize::A4;
+    if (parser.isSet(OutOption))
+        request.file = QFileInfo(parser.value(OutOption)).absoluteFilePath();
+    auto store = openStore(parser);
     return runOutput(*store, request);
 }
 
@@ -226,6 +267,7 @@ QString overview()
                           "Commands:\n"
                           "  catalog   write the catalog and print the path of its first page\n"
                           "  list      write the plain item list and print its path\n"
+                          "  pdf       write the catalog as a PDF file and print its path\n"
                           "  demo      write the catalog of the bundled demo database\n"
                           "  sql       print every statement a run would send\n"
                           "\n"
@@ -235,9 +277,11 @@ QString overview()
 int run(const QString &command, const QStringList &arguments)
 {
     if (command == QLatin1String("catalog"))
-        return catalogOrList(true, arguments);
+        return catalogOrList(RunRequest::Output::Catalog, arguments);
     if (command == QLatin1String("list"))
-        return catalogOrList(false, arguments);
+        return catalogOrList(RunRequest::Output::List, arguments);
+    if (command == QLatin1String("pdf"))
+        return pdf(arguments);
     if (command == QLatin1String("demo"))
         return demo(arguments);
     if (command == QLatin1String("sql"))

@@ -3,13 +3,23 @@
 #include "control/Program.h"
 
 #include <QCoreApplication>
+#include <QGuiApplication>
 #include <QTextStream>
 #include <cstdio>
+#include <cstring>
+#include <memory>
 
 int main(int argc, char *argv[])
 {
     zorbin::prepareProcess();
-    QCoreApplication app(argc, argv);
+    // The PDF command draws (fonts, pictures): it needs a GUI application, on the offscreen
+    // platform when there is no display to connect to.
+    const bool draws = argc > 1 && std::strcmp(argv[1], "pdf") == 0;
+    if (draws && qEnvironmentVariableIsEmpty("DISPLAY") && qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY") &&
+        qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
+        qputenv("QT_QPA_PLATFORM", "offscreen");
+    const std::unique_ptr<QCoreApplication> app = draws ? std::make_unique<QGuiApplication>(argc, argv)
+                                                        : std::make_unique<QCoreApplication>(argc, argv);
     QCoreApplication::setApplicationName(QStringLiteral("zorbin-cli"));
     QCoreApplication::setApplicationVersion(QStringLiteral(ZORBIN_VERSION));
 

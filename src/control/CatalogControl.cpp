@@ -158,9 +158,29 @@ RunOutcome CatalogControl::prepareMarking()
 
 RunOutcome CatalogControl::makeCatalog()
 {
+    return makeCatalogWith([this](RunOutcome outcome) { return CreateCatalog(outcome); });
+}
+
+RunOutcome CatalogControl::askAndMakePdf()
+{
     if (m_running)
         return {};
-    // A grid the pages cannot use is named before anything is collected or deleted.
+    if (m_user.ask(CatalogQuestion, CatalogQuestionTitle, QuestionButtons::YesNo) != Answer::Yes)
+        return {};
+    return makePdf(PdfPageSize::A4);
+}
+
+RunOutcome CatalogControl::makePdf(PdfPageSize pageSize, const QString &file)
+{
+    return makeCatalogWith(
+        [this, pageSize, &file](RunOutcome outcome) { return writePdf(outcome, pageSize, file); });
+}
+
+RunOutcome CatalogControl::makeCatalogWith(const std::function<RunOutcome(RunOutcome)> &write)
+{
+    if (m_running)
+        return {};
+    // A grid the catalog cannot use is named before anything is collected or deleted.
     if (const auto grid = readGridSize(m_settings); !grid)
         return fail(grid.status());
     BusyScope busy(*this);
@@ -172,13 +192,13 @@ RunOutcome CatalogControl::makeCatalog()
             return *ended;
     }
     m_state.StopRequested = false;
-    return CreateCatalog(outcome);
+    if (m_state.WorkDBFile.isEmpty())
+        return fail(Status::fault(NoWorkDatabaseText));
+    return write(outcome);
 }
 
 RunOutcome CatalogControl::CreateCatalog(RunOutcome outcome)
 {
-    if (m_state.WorkDBFile.isEmpty())
-        return fail(Status::fault(NoWorkDatabaseText));
     const QString folder = outputFolderOf(m_settings);
     if (const Status made = ensureFolder(m_files, folder); !made)
         return fail(made);
@@ -194,13 +214,44 @@ RunOutcome CatalogControl::CreateCatalog(RunOutcome outcome)
         return fail(page.status());
     if (const Status styled = m_stages->CreateCSS(m_context, folder, true); !styled)
         return fail(styled);
-    if (page.value().isEmpty()) {
-        m_user.tell(NoItemsText, NoItemsTitle, MessageIcon::Information);
-        if (outcome.ending != RunOutcome::Ending::Partial)
-            outcome = {RunOutcome::Ending::NoItems, {}, NoItemsText};
-        return outcome;
-    }
+    if (page.value().isEmpty())
+        return noItems(outcome);
     return show(page.value(), outcome);
+}
+
+RunOutcome CatalogControl::writePdf(RunOutcome outcome, PdfPageSize pageSize, const QString &file)
+{
+    QString target = file;
+    if (target.isEmpty()) {
+        const QString folder = outputFolderOf(m_settings);
+        if (const Status made = ensureFolder(m_files, folder); !made)
+            return fail(made);
+        target = folder + PdfFileName;
+    }
+    const Result<PdfWritten> written =
+        m_stages->CreateCatPDF(m_context, {target, m_state.WorkDBFile, pageSize});
+    if (!written)
+        return fail(written.status());
+    switch (written->ending) {
+    case PdfWritten::Ending::NoItems:
+        return noItems(outcome);
+    case PdfWritten::Ending::Stopped:
+        // Nothing half-written is shown; an older PDF stays as it was.
+        if (outcome.ending == RunOutcome::Ending::Complete)
+            outcome.ending = RunOutcome::Ending::Stopped;
+        return outcome;
+    case PdfWritten::Ending::Written:
+        break;
+    }
+    return show(written->file, outcome);
+}
+
+RunOutcome CatalogControl::noItems(RunOutcome outcome)
+{
+    m_user.tell(NoItemsText, NoItemsTitle, MessageIcon::Information);
+    if (outcome.ending != RunOutcome::Ending::Partial)
+        outcome = {RunOutcome::Ending::NoItems, {}, NoItemsText};
+    return outcome;
 }
 
 RunOutcome CatalogControl::makeList(bool collectAnew)

@@ -9,6 +9,7 @@
 #include "model/RunState.h"
 #include "model/SettingsPersistence.h"
 
+#include <functional>
 #include <memory>
 
 namespace zorbin {
@@ -60,6 +61,11 @@ public:
 
     // Collects unless the items are marked by hand, writes the catalog and opens its first page.
     RunOutcome makeCatalog();
+    // The catalog as a PDF: asks, then makePdf() on A4 paper into the output folder.
+    RunOutcome askAndMakePdf();
+    // Collects unless the items are marked by hand, writes the catalog as a PDF into `file`
+    // (empty: PdfFileName in the output folder) and opens it.
+    RunOutcome makePdf(PdfPageSize pageSize, const QString &file = {});
     // Collects when asked to, writes the item list and opens it.
     RunOutcome makeList(bool collectAnew);
     // A collection on its own.
@@ -75,7 +81,14 @@ private:
     // The collection of a run: nothing when it may go on (a failed step was told and noted in
     // `outcome`), the outcome that ends the run otherwise.
     std::optional<RunOutcome> collect(RunOutcome &outcome);
+    // The road every form of the catalog takes: the grid checked before anything is touched,
+    // the items collected unless they are marked by hand, the stop request cleared, and then
+    // `write`, given the outcome so far, with the working database there.
+    RunOutcome makeCatalogWith(const std::function<RunOutcome(RunOutcome)> &write);
     RunOutcome CreateCatalog(RunOutcome outcome);
+    RunOutcome writePdf(RunOutcome outcome, PdfPageSize pageSize, const QString &file);
+    // The catalog query had no rows: the user is told, and nothing is shown.
+    RunOutcome noItems(RunOutcome outcome);
     RunOutcome fail(const Status &status);
     RunOutcome show(const QString &file, RunOutcome outcome);
 

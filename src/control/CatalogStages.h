@@ -1,6 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
+#include "pdf/CatalogPdf.h"
 #include "workdb/CollectionRun.h"
 
 #include <QString>
@@ -33,6 +34,8 @@ public:
                                           const QString &dbFile, const QString &imagesFolder) = 0;
     virtual Status CreateCSS(RunContext &context, const QString &outputFolder, bool replace) = 0;
     virtual Status CreateListHTML(RunContext &context, const QString &fileName, const QString &dbFile) = 0;
+    // Writes the catalog as a PDF (CatalogPdf.h).
+    virtual Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request) = 0;
 };
 
 } // namespace zorbin

@@ -49,6 +49,10 @@ public:
     {
         return zorbin::CreateListHTML(context, fileName, dbFile);
     }
+    Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request) override
+    {
+        return zorbin::CreateCatPDF(context, request);
+    }
 
 private:
     SettingsStore &m_store;

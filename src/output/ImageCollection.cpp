@@ -5,6 +5,7 @@
 #include "model/RunContext.h"
 #include "output/CatalogQuery.h"
 #include "output/FileNaming.h"
+#include "output/PictureReference.h"
 #include "output/images/PictureCopier.h"
 #include "platform/FileSystem.h"
 #include "workdb/WorkDatabase.h"
@@ -15,9 +16,6 @@
 
 namespace zorbin {
 namespace {
-
-// The mark of the item collection for an item without a picture.
-const QString NoPicture = QStringLiteral("?");
 
 // The picture references of the catalog items in catalog order; an empty list when no cell
 // line shows the picture (the statement then has no ItemPic column).
@@ -52,8 +50,8 @@ Status CollectCatImages(RunContext &context, const QString &imagesFolder, const 
     images::PictureCopier copier(context.files, imagesFolder);
 
     const QString &logo = context.settings.logo;
-    if (!logo.isEmpty() && context.files.fileExists(logo)) {
-        if (const Status copied = copier.copy(logo, ImageFileName(imagesFolder, logo)); !copied)
+    if (const std::optional<QString> source = logoSourceFile(context.files, logo)) {
+        if (const Status copied = copier.copy(*source, ImageFileName(imagesFolder, logo)); !copied)
             return copied;
     }
 
@@ -67,11 +65,11 @@ Status CollectCatImages(RunContext &context, const QString &imagesFolder, const 
         ++done;
         // References are looked up literally: "?" marks an item without a picture, and no
         // reference is a pattern that could match some other file.
-        if (!reference.isEmpty() && reference != NoPicture) {
+        if (namesPicture(reference)) {
             // Items share pictures: each reference is looked up once.
             auto known = sources.constFind(reference);
             if (known == sources.cend())
-                known = sources.insert(reference, context.files.findFile(reference));
+                known = sources.insert(reference, pictureSourceFile(context.files, reference));
             if (const std::optional<QString> &source = known.value()) {
                 // The copy takes the name the pages give it, so that they find it wherever
                 // file names are case-sensitive.

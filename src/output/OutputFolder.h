@@ -15,6 +15,7 @@ inline const QString PagePrefixName = QStringLiteral("zo");
 inline const QString StylesheetName = QStringLiteral("tarnik.css");
 inline const QString ListPageName = QStringLiteral("zorbin3.htm");
 inline const QString ImagesFolderName = QStringLiteral("images");
+inline const QString PdfFileName = QStringLiteral("zorbin.pdf");
 
 // The output folder of the settings, with a separator at its end: `txtPagingPath`, or the
 // temporary folder when that is empty.

@@ -58,6 +58,14 @@ public:
         return listResult;
     }
 
+    Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request) override
+    {
+        record(context, QStringLiteral("CreateCatPDF(%1,%2)").arg(request.file, request.dbFile));
+        if (!pdfResult)
+            return pdfResult;
+        return pdfWritten;
+    }
+
     // The calls without their arguments, e.g. "CreateCSS".
     QStringList names() const
     {
@@ -76,6 +84,8 @@ public:
     Status pagesResult;
     Status cssResult;
     Status listResult;
+    Status pdfResult;
+    PdfWritten pdfWritten{PdfWritten::Ending::Written, QStringLiteral("/out/zorbin.pdf"), 1, 0, 0};
     // Stage name (e.g. "BuildAndCollectData") -> what happens inside it.
     std::function<void(const QString &stage)> during;
     // What a stop request looked like when each stage began.
