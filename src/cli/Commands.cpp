@@ -5,9 +5,12 @@
 #include "control/Statements.h"
 #include "control/CatalogControl.h"
 #include "control/Program.h"
+#include "model/SettingsPersistence.h"
+#include "output/OutputFolder.h"
 #include "platform/Browser.h"
 #include "platform/FileSystem.h"
 #include "platform/SettingsStore.h"
+#include "web/CatalogSite.h"
 
 #include <QCommandLineParser>
 #include <QDir>
@@ -197,6 +200,65 @@ int demo(const QStringList &arguments)
     return runOutput(*store, request);
 }
 
+// The web catalog on the control as it is: collects unless the items were marked by hand, then
+// writes the site; "sections by sort group" is the store's WebSections ("0" off, on otherwise).
+int web(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        QStringLiteral("Writes the web catalog and prints the path of its first page."));
+    addRunOptions(parser);
+    parser.addOption({OutOption, QStringLiteral("The site's folder (default: site in the output folder)."),
+                      QStringLiteral("DIR")});
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    auto store = openStore(parser);
+    std::unique_ptr<Browser> browser = parser.isSet(OpenOption) ? makeSystemBrowser() : nullptr;
+    CliUserPort user(browser.get());
+    CatalogControl control(user, *store, localFileSystem());
+    control.UserControl_Initialize();
+    CatalogSettings &settings = control.settings();
+    RunState &state = control.runState();
+    if (parser.isSet(UseMarkedOption)) {
+        settings.ChkSelectAccount = CheckValue::Checked;
+        state.WorkDBFile = lastWorkDatabase();
+    }
+    if (parser.isSet(OnlyWithPictureOption))
+        settings.ChkOnlyWithPic = CheckValue::Checked;
+    if (!parser.isSet(UseMarkedOption)) {
+        if (const Status collected = control.collect(); !collected) {
+            err() << collected.description() << '\n';
+            return Failure;
+        }
+    }
+    const QString folder = parser.isSet(OutOption) ? QFileInfo(parser.value(OutOption)).absoluteFilePath()
+                                                   : outputFolderOf(settings) + QStringLiteral("site");
+    if (!QDir().mkpath(QFileInfo(folder).absolutePath())) {
+        err() << "Cannot create the folder " << QDir::toNativeSeparators(folder) << '\n';
+        return Failure;
+    }
+    const SiteRequest request{folder, state.WorkDBFile,
+                              store->read(StoreApp, StoreSection, QStringLiteral("WebSections"), QString()) !=
+                                  QLatin1String("0")};
+    const Result<QString> first = CreateCatSite(control.context(), request);
+    if (!first) {
+        err() << first.status().description() << '\n';
+        return Failure;
+    }
+    const int collected = state.CollectFailed ? Failure : Success;
+    if (first->isEmpty())
+        return state.CollectFailed ? Failure : EmptyCatalog;
+    out() << QDir::toNativeSeparators(first.value()) << '\n';
+    out().flush();
+    if (const Status opened = user.openBrowser(first.value()); !opened) {
+        err() << opened.description() << '\n';
+        return Failure;
+    }
+    return collected;
+}
+
 int sql(const QStringList &arguments)
 {
     QCommandLineParser parser;
@@ -232,6 +294,7 @@ QString overview()
                           "Commands:\n"
                           "  catalog   write the catalog and print the path of its first page\n"
                           "  list      write the plain item list and print its path\n"
+                          "  web       write the web catalog and print the path of its first page\n"
                           "  demo      write the catalog of the bundled demo database\n"
                           "  sql       print every statement a run would send\n"
                           "\n"
@@ -244,6 +307,8 @@ int run(const QString &command, const QStringList &arguments)
         return catalogOrList(true, arguments);
     if (command == QLatin1String("list"))
         return catalogOrList(false, arguments);
+    if (command == QLatin1String("web"))
+        return web(arguments);
     if (command == QLatin1String("demo"))
         return demo(arguments);
     if (command == QLatin1String("sql"))

@@ -1,0 +1,315 @@
+#include "web/CatalogSite.h"
+
+#include "model/ProgressMeter.h"
+#include "model/RunContext.h"
+#include "output/CatalogRows.h"
+#include "output/OutputFolder.h"
+#include "platform/FileSystem.h"
+#include "platform/Paths.h"
+#include "web/ItemArticle.h"
+#include "web/SearchIndex.h"
+#include "web/SiteFile.h"
+#include "web/SiteLayout.h"
+#include "web/SiteNames.h"
+#include "web/SitePage.h"
+#include "web/SiteScript.h"
+#include "web/SiteSections.h"
+#include "web/SiteStaging.h"
+#include "web/SiteStyle.h"
+#include "web/ThumbnailStore.h"
+
+#include <QDir>
+#include <QFile>
+#include <numeric>
+
+namespace zorbin {
+namespace {
+
+// The logo's box: a band's height, most of a phone's width.
+const QSize LogoBox(480, 160);
+
+// Where the first pass keeps the items it made, in the staging folder.
+const QString SpoolName = QStringLiteral("items.spool");
+
+// One item as the first pass left it in the spool: its article's inside, then the start of
+// its search entry.
+struct SpooledItem
+{
+    qint64 offset = 0;
+    qint32 articleBytes = 0;
+    qint32 entryBytes = 0;
+};
+
+// One run of the site writer. The first pass reads the catalog rows once, in catalog order,
+// makes the thumbnails and writes each item's article into a spool file, keeping only its place
+// and sort group in memory; the second pass writes the pages in site order (by section, when
+// asked), reading each item back from the spool. So a catalog of any size costs memory only
+// for its count of items, never for their texts.
+class SiteRun
+{
+public:
+    enum class Stop { No, Requested };
+
+    SiteRun(RunContext &context, const SiteRequest &request, const SiteLayout &layout, CatalogRows &rows,
+            ThumbnailStore &pictures, const SiteStaging &staging, QHash<qint64, QString> groupNames)
+        : m_context(context), m_request(request), m_layout(layout), m_rows(rows), m_pictures(pictures),
+          m_staging(staging), m_groupNames(std::move(groupNames)),
+          m_article(layout, rows, Separators::ofSystem()), m_meter(context.user, context.state),
+          m_total(2 * rows.count())
+    {}
+
+    // Writes the site into the staging folder. Nothing is staged for a catalog without items.
+    Result<Stop> build()
+    {
+        if (m_rows.count() == 0)
+            return Stop::No;
+        m_spool.setFileName(m_staging.path(SpoolName));
+        if (!m_spool.open(QIODevice::ReadWrite | QIODevice::Truncate))
+            return spoolFailure();
+        auto spooled = spoolItems();
+        if (!spooled || spooled.value() == Stop::Requested)
+            return spooled;
+        planOrder();
+        if (m_layout.topBand && !m_layout.logo.isEmpty()) {
+            if (const auto logo = m_context.files.findFile(m_layout.logo)) {
+                auto made = m_pictures.thumbnailOf(*logo, LogoBox);
+                if (!made)
+                    return made.status();
+                m_logo = made.value();
+            }
+        }
+        auto written = writePages();
+        m_spool.close();
+        if (!written || written.value() == Stop::Requested)
+            return written;
+        if (const Status styled = writeFile(site::StylesheetName, siteStylesheet(m_layout)); !styled)
+            return styled;
+        if (const Status scripted = writeFile(site::ScriptName, siteScript()); !scripted)
+            return scripted;
+        return Stop::No;
+    }
+
+    // The files written into the staging folder, by name.
+    const QStringList &staged() const { return m_staged; }
+
+private:
+    Result<Stop> spoolItems()
+    {
+        QByteArray article;
+        QByteArray entry;
+        for (long long done = 1; m_rows.next(); ++done) {
+            std::optional<Thumbnail> picture;
+            if (const QString reference = m_article.pictureReference(); !reference.isEmpty()) {
+                auto found = pictureOf(reference);
+                if (!found)
+                    return found.status();
+                picture = found.value();
+            }
+            article.truncate(0);
+            entry.truncate(0);
+            if (const Status written = m_article.write(picture ? &*picture : nullptr, article, entry);
+                !written)
+                return written;
+            m_items.push_back(
+                {m_spool.pos(), static_cast<qint32>(article.size()), static_cast<qint32>(entry.size())});
+            if (m_spool.write(article) != article.size() || m_spool.write(entry) != entry.size())
+                return spoolFailure();
+            if (m_request.sections)
+                m_groups.push_back(m_article.sortGroup());
+            if (m_meter.tick(done, m_total))
+                return Stop::Requested;
+        }
+        if (!m_rows.status())
+            return m_rows.status();
+        if (!m_spool.flush())
+            return spoolFailure();
+        return Stop::No;
+    }
+
+    // Each reference is looked up once a run: items share pictures.
+    Result<Thumbnail> pictureOf(const QString &reference)
+    {
+        if (const auto known = m_thumbnails.constFind(reference); known != m_thumbnails.cend())
+            return known.value();
+        // Looked up as the classic catalog's picture copying looks it up.
+        const std::optional<QString> file = m_context.files.findFile(reference);
+        auto made = file ? m_pictures.thumbnailOf(*file, m_layout.pictureBox)
+                         : m_pictures.placeholder(m_layout.pictureBox);
+        if (made)
+            m_thumbnails.insert(reference, made.value());
+        return made;
+    }
+
+    void planOrder()
+    {
+        if (m_request.sections) {
+            m_plan = planSections(m_groups, m_groupNames);
+            m_groups = {};
+            return;
+        }
+        m_plan.order.resize(m_items.size());
+        std::iota(m_plan.order.begin(), m_plan.order.end(), 0);
+    }
+
+    Result<Stop> writePages()
+    {
+        const auto count = static_cast<long long>(m_items.size());
+        const long long perPage = m_layout.itemsPerPage();
+        const long long pageCount = (count + perPage - 1) / perPage;
+        auto index = SiteFile::create(m_context.files, m_staging.path(site::SearchIndexName));
+        if (!index)
+            return index.status();
+        m_staged << site::SearchIndexName;
+        writeSearchIndexStart(*index.value());
+        std::size_t section = 0;
+        for (long long page = 1; page <= pageCount; ++page) {
+            const QString name = site::pageFileName(page);
+            auto created = SiteFile::create(m_context.files, m_staging.path(name));
+            if (!created)
+                return created.status();
+            m_staged << name;
+            SiteFile &file = *created.value();
+            file.writeBytes(pageStart(m_layout, page, m_logo ? &*m_logo : nullptr));
+            if (page == 1 && m_request.sections)
+                file.writeBytes(sectionList(m_plan.sections, perPage));
+            file.writeBytes("<main id=\"catalog\">\n");
+            bool open = false; // a section's grid, or the page's
+            for (long long place = (page - 1) * perPage; place < std::min(count, page * perPage); ++place) {
+                if (m_request.sections) {
+                    while (m_plan.sections[section].first + m_plan.sections[section].count <= place)
+                        ++section;
+                    const Section &current = m_plan.sections[section];
+                    if (open && place == current.first)
+                        file.writeBytes("</div>\n</section>\n");
+                    if (!open || place == current.first)
+                        file.writeBytes(sectionStart(current));
+                } else if (!open) {
+                    file.writeBytes("<div class=\"grid\">\n");
+                }
+                open = true;
+                const SpooledItem &item =
+                    m_items[static_cast<std::size_t>(m_plan.order[static_cast<std::size_t>(place)])];
+                if (!m_spool.seek(item.offset))
+                    return spoolFailure();
+                const QByteArray bytes = m_spool.read(item.articleBytes + item.entryBytes);
+                if (bytes.size() != item.articleBytes + item.entryBytes)
+                    return spoolFailure();
+                file.writeBytes("<article class=\"item\" id=\"i" + QByteArray::number(place + 1) + "\">\n");
+                file.writeBytes(QByteArrayView(bytes).first(item.articleBytes));
+                file.writeBytes("</article>\n");
+                writeSearchEntry(*index.value(), QByteArrayView(bytes).sliced(item.articleBytes), page,
+                                 place + 1, place == 0);
+                if (m_meter.tick(count + place + 1, m_total))
+                    return Stop::Requested;
+            }
+            if (open)
+                file.writeBytes(m_request.sections ? "</div>\n</section>\n" : "</div>\n");
+            file.writeBytes("</main>\n");
+            file.writeBytes(pageEnd(m_layout, page, pageCount));
+            if (const Status closed = file.close(); !closed)
+                return closed;
+        }
+        writeSearchIndexEnd(*index.value());
+        if (const Status closed = index.value()->close(); !closed)
+            return closed;
+        return Stop::No;
+    }
+
+    Status writeFile(const QString &name, QByteArrayView bytes)
+    {
+        auto created = SiteFile::create(m_context.files, m_staging.path(name));
+        if (!created)
+            return created.status();
+        m_staged << name;
+        created.value()->writeBytes(bytes);
+        return created.value()->close();
+    }
+
+    Status spoolFailure() const
+    {
+        return Status::fault(QStringLiteral("לא ניתן לכתוב את הקובץ %1: %2")
+                                 .arg(QDir::toNativeSeparators(m_spool.fileName()), m_spool.errorString()));
+    }
+
+    RunContext &m_context;
+    const SiteRequest &m_request;
+    const SiteLayout &m_layout;
+    CatalogRows &m_rows;
+    ThumbnailStore &m_pictures;
+    const SiteStaging &m_staging;
+    QHash<qint64, QString> m_groupNames;
+    ItemArticle m_article;
+    ProgressMeter m_meter;
+    long long m_total = 0; // progress: every item read, then every item written
+    QFile m_spool;
+    std::vector<SpooledItem> m_items;            // in catalog order
+    std::vector<std::optional<qint64>> m_groups; // their sort groups, with sections
+    SectionPlan m_plan;
+    QHash<QString, Thumbnail> m_thumbnails; // picture reference -> its thumbnail
+    std::optional<Thumbnail> m_logo;
+    QStringList m_staged;
+};
+
+// The first page of the site that a stopped or failed run leaves, or the empty text.
+QString earlierFirstPage(const FileSystem &files, const QString &folder)
+{
+    const QString first = withTrailingSeparator(folder) + site::pageFileName(1);
+    return files.fileExists(first) ? first : QString();
+}
+
+} // namespace
+
+Result<QString> CreateCatSite(RunContext &context, const SiteRequest &request)
+{
+    ProgressMeter meter(context.user, context.state);
+    meter.reset();
+    const auto layout = SiteLayout::read(context.settings);
+    if (!layout)
+        return layout.status();
+    QHash<qint64, QString> groupNames;
+    if (request.sections) {
+        auto names = readSortGroupNames(request.dbFile);
+        if (!names)
+            return names.status();
+        groupNames = std::move(names).value();
+    }
+    auto rows = CatalogRows::open(request.dbFile, context.settings);
+    if (!rows)
+        return rows.status();
+    if (const Status made = ensureFolder(context.files, request.folder); !made)
+        return made;
+    auto pictures = ThumbnailStore::open(request.folder);
+    if (!pictures)
+        return pictures.status();
+    const auto staging = SiteStaging::prepare(request.folder);
+    if (!staging)
+        return staging.status();
+
+    QStringList staged;
+    {
+        SiteRun run(context, request, layout.value(), *rows.value(), *pictures.value(), staging.value(),
+                    std::move(groupNames));
+        const auto built = run.build();
+        if (!built || built.value() == SiteRun::Stop::Requested) {
+            staging->discard();
+            // What was made is kept for the next run; a failure to record it is not this run's news.
+            (void)pictures.value()->saveRecord(true);
+            if (!built)
+                return built.status();
+            return earlierFirstPage(context.files, request.folder);
+        }
+        staged = run.staged();
+    }
+    if (const Status published = staging->publish(context.files, staged); !published)
+        return published;
+    if (const Status removed = pictures.value()->removeUnused(); !removed)
+        return removed;
+    if (const Status recorded = pictures.value()->saveRecord(false); !recorded)
+        return recorded;
+    meter.reset();
+    if (staged.isEmpty())
+        return QString();
+    return withTrailingSeparator(request.folder) + site::pageFileName(1);
+}
+
+} // namespace zorbin
