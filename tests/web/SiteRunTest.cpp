@@ -10,6 +10,7 @@
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
 #include "web/CatalogSite.h"
+#include "web/SiteNames.h"
 #include "web/SiteSections.h"
 
 #include <QDirIterator>
@@ -63,13 +64,10 @@ QString keysByPage(const QMap<QString, QByteArray> &site)
 {
     static const QRegularExpression key(QStringLiteral("<bdi>(K\\d)</bdi>"));
     QStringList pages;
-    for (int page = 1;
-         site.contains(page == 1 ? QStringLiteral("index.html") : QStringLiteral("page-%1.html").arg(page));
-         ++page) {
+    for (long long page = 1; site.contains(site::pageFileName(page)); ++page) {
         QStringList keys;
-        const QString html = QString::fromUtf8(
-            site.value(page == 1 ? QStringLiteral("index.html") : QStringLiteral("page-%1.html").arg(page)));
-        for (auto match = key.globalMatch(html); match.hasNext();)
+        for (auto match = key.globalMatch(QString::fromUtf8(site.value(site::pageFileName(page))));
+             match.hasNext();)
             keys << match.next().captured(1);
         pages << keys.join(QLatin1Char(' '));
     }
@@ -189,14 +187,13 @@ private Q_SLOTS:
             QCOMPARE(result.value(), site() + QStringLiteral("/index.html"));
         else
             QVERIFY(result.status().description().contains(QStringLiteral("page-2.html")));
-        QMap<QString, QByteArray> after = contents(site());
-        // The record may list its entries in another order.
-        QCOMPARE(after.take(QStringLiteral("pictures/thumbnails.txt")).size(),
-                 QMap(before).take(QStringLiteral("pictures/thumbnails.txt")).size());
-        QMap<QString, QByteArray> expected = before;
-        expected.remove(QStringLiteral("pictures/thumbnails.txt"));
-        QCOMPARE(after.keys(), expected.keys());
-        QVERIFY(after == expected);
+        // The cache record may list its entries in another order; the rest is as it was.
+        const auto withoutRecord = [](QMap<QString, QByteArray> all) {
+            all.remove(QStringLiteral("pictures/thumbnails.txt"));
+            return all;
+        };
+        QCOMPARE(withoutRecord(contents(site())).keys(), withoutRecord(before).keys());
+        QVERIFY(withoutRecord(contents(site())) == withoutRecord(before));
     }
 
     void emptyCatalogRemovesTheEarlierSite()
