@@ -1,0 +1,169 @@
+// The web catalog benchmark. Writes the web catalog of a working database of 100,000 items
+// (8 x 3 a page, a picture box of 120 x 90, four text lines, 1,000 distinct JPEG pictures of
+// 1600 x 1200) twice into the same folder: the first run makes the thumbnails, the second
+// reuses them. Next to it, the classic catalog run on the same data (a file per page with its
+// pictures copied, as the catalog button writes it), each timed with its peak memory.
+//
+//   web-benchmark [--items N] [--pictures N] [--folder DIR] [--sections on|off]
+#include "BenchCatalog.h"
+#include "CameraPictures.h"
+#include "MemoryUse.h"
+#include "model/CatalogSettings.h"
+#include "model/ConnectionParams.h"
+#include "model/RunContext.h"
+#include "model/RunState.h"
+#include "model/UserPort.h"
+#include "output/CatalogPages.h"
+#include "output/ImageCollection.h"
+#include "output/OutputFolder.h"
+#include "output/Stylesheet.h"
+#include "platform/FileSystem.h"
+#include "web/CatalogSite.h"
+
+#include <QCommandLineParser>
+#include <QCoreApplication>
+#include <QDateTime>
+#include <QDir>
+#include <QElapsedTimer>
+#include <QTemporaryDir>
+#include <cstdio>
+#include <functional>
+
+using namespace zorbin;
+using namespace zorbin::bench;
+
+namespace {
+
+// A user who watches: the progress bar is kept, nothing is asked, nothing stops the run.
+class QuietUserPort final : public UserPort
+{
+public:
+    Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
+    void tell(const QString &text, const QString &, MessageIcon) override
+    {
+        std::fprintf(stderr, "%s\n", qPrintable(text));
+    }
+    void showStatus(const QString &) override {}
+    int progressFrameWidth() const override { return 1000; }
+    int progressFillWidth() const override { return m_fill; }
+    void setProgressFillWidth(int width) override { m_fill = width; }
+    void yield() override {}
+    Status openBrowser(const QString &) override { return Status::ok(); }
+
+private:
+    int m_fill = 0;
+};
+
+void fail(const Status &status)
+{
+    if (!status)
+        qFatal("%s", qPrintable(status.description()));
+}
+
+struct Timing
+{
+    double seconds = 0;
+    double peakMb = 0;
+};
+
+Timing measure(const std::function<void()> &run)
+{
+    resetPeakMemory();
+    QElapsedTimer timer;
+    timer.start();
+    run();
+    return {timer.nsecsElapsed() / 1e9, peakMemoryKb() / 1024.0};
+}
+
+// Files in the folder (not below it) changed since `since`, and their total size.
+std::pair<int, double> filesSince(const QString &folder, const QDateTime &since)
+{
+    int count = 0;
+    double megabytes = 0;
+    for (const QFileInfo &file : QDir(folder).entryInfoList(QDir::Files)) {
+        if (file.lastModified() >= since) {
+            ++count;
+            megabytes += file.size() / 1e6;
+        }
+    }
+    return {count, megabytes};
+}
+
+} // namespace
+
+int main(int argc, char *argv[])
+{
+    QCoreApplication app(argc, argv);
+    QCommandLineParser parser;
+    parser.addHelpOption();
+    const QCommandLineOption itemsOption(QStringLiteral("items"), QStringLiteral("catalog items"),
+                                         QStringLiteral("N"), QStringLiteral("100000"));
+    const QCommandLineOption picturesOption(QStringLiteral("pictures"), QStringLiteral("distinct pictures"),
+                                            QStringLiteral("N"), QStringLiteral("1000"));
+    const QCommandLineOption folderOption(
+        QStringLiteral("folder"),
+        QStringLiteral("work folder, its pictures kept (default: a new temporary one)"),
+        QStringLiteral("DIR"));
+    const QCommandLineOption sectionsOption(QStringLiteral("sections"), QStringLiteral("on or off"),
+                                            QStringLiteral("ON"), QStringLiteral("on"));
+    parser.addOptions({itemsOption, picturesOption, folderOption, sectionsOption});
+    parser.process(app);
+    const int items = parser.value(itemsOption).toInt();
+
+    QTemporaryDir temporary;
+    const QString work = parser.isSet(folderOption) ? parser.value(folderOption) : temporary.path();
+    QDir(work).mkpath(QStringLiteral("pictures"));
+    const QString output = work + QStringLiteral("/catalog/");
+    const QString site = work + QStringLiteral("/site");
+    const QString database = work + QStringLiteral("/zorbindb.tmp");
+
+    QElapsedTimer preparing;
+    preparing.start();
+    const Result<QStringList> pictures = makeCameraPictures(
+        work + QStringLiteral("/pictures"), parser.value(picturesOption).toInt(), QSize(1600, 1200));
+    fail(pictures.status());
+    fail(makeWorkDatabase(database, items, pictures.value()));
+    std::printf("Prepared %d items and %lld pictures of 1600 x 1200 in %s in %.1f s\n", items,
+                static_cast<long long>(pictures->size()), qPrintable(work), preparing.nsecsElapsed() / 1e9);
+
+    CatalogSettings settings;
+    useBenchSettings(settings, output, pictures->constFirst());
+    settings.cmbPageSplit.setCurrentIndex(1);
+    ConnectionParams connection;
+    RunState state;
+    QuietUserPort user;
+    RunContext context{settings, connection, state, user, localFileSystem()};
+    fail(ensureFolder(context.files, output));
+
+    // The classic run as the catalog button makes it: clean, copy the pictures, pages, stylesheet.
+    const auto classic = [&] {
+        const QString images = imagesFolderOf(output);
+        fail(cleanCatalogOutput(context.files, output));
+        fail(CollectCatImages(context, images, database));
+        fail(CreateCatHTML(context, output + PagePrefixName, database, images).status());
+        fail(CreateCSS(context, output, true));
+    };
+    for (int round = 1; round <= 2; ++round) {
+        const Timing timing = measure(classic);
+        std::printf("Classic catalog run %d: %.2f s, peak memory %.1f MB\n", round, timing.seconds,
+                    timing.peakMb);
+    }
+    const Timing reference = measure(classic);
+    std::printf("Classic catalog run 3: %.2f s, peak memory %.1f MB (the reference)\n", reference.seconds,
+                reference.peakMb);
+
+    QDir(site).removeRecursively();
+    const SiteRequest request{site, database, parser.value(sectionsOption) != QLatin1String("off")};
+    for (const char *name :
+         {"first (thumbnails made)", "second (thumbnails reused)", "third (thumbnails reused)"}) {
+        const QDateTime start = QDateTime::currentDateTime().addMSecs(-20);
+        const Timing timing = measure([&] { fail(CreateCatSite(context, request).status()); });
+        const auto [thumbnails, megabytes] = filesSince(site + QStringLiteral("/pictures"), start);
+        const auto [pages, pageMegabytes] = filesSince(site, start);
+        std::printf("Web catalog run, %s, sections %s: %.2f s, peak memory %.1f MB; %d files %.1f MB written "
+                    "into the site folder, %d thumbnail files %.1f MB (%.2fx the classic run)\n",
+                    name, request.sections ? "on" : "off", timing.seconds, timing.peakMb, pages,
+                    pageMegabytes, thumbnails, megabytes, timing.seconds / reference.seconds);
+    }
+    return 0;
+}
