@@ -101,11 +101,19 @@ void ItemArticle::writePicture(const Thumbnail *picture, const QString &name, QB
         return;
     article += "<img alt=\"";
     appendEscaped(article, name);
-    article += "\" src=\"" + picture->file.toUtf8() + '"';
-    if (!picture->twiceFile.isEmpty())
-        article += " srcset=\"" + picture->file.toUtf8() + " 1x, " + picture->twiceFile.toUtf8() + " 2x\"";
-    article += " width=\"" + QByteArray::number(picture->size.width()) + "\" height=\"" +
-               QByteArray::number(picture->size.height()) + "\" loading=\"lazy\">";
+    article += imageAttributes(*picture);
+}
+
+const QByteArray &ItemArticle::imageAttributes(const Thumbnail &picture) const
+{
+    if (const auto known = m_images.constFind(picture.file); known != m_images.cend())
+        return known.value();
+    QByteArray attributes = "\" src=\"" + picture.file.toUtf8() + '"';
+    if (!picture.twiceFile.isEmpty())
+        attributes += " srcset=\"" + picture.file.toUtf8() + " 1x, " + picture.twiceFile.toUtf8() + " 2x\"";
+    attributes += " width=\"" + QByteArray::number(picture.size.width()) + "\" height=\"" +
+                  QByteArray::number(picture.size.height()) + "\" loading=\"lazy\">";
+    return m_images.insert(picture.file, attributes).value();
 }
 
 } // namespace zorbin

@@ -4,6 +4,7 @@
 #include "platform/ValueFormat.h"
 
 #include <QByteArray>
+#include <QHash>
 #include <QString>
 #include <optional>
 #include <vector>
@@ -47,6 +48,7 @@ private:
     };
 
     void writePicture(const Thumbnail *picture, const QString &name, QByteArray &article) const;
+    const QByteArray &imageAttributes(const Thumbnail &picture) const;
 
     const CatalogRows &m_rows;
     Separators m_separators;
@@ -55,6 +57,8 @@ private:
     int m_name = -1;
     int m_sort = -1;
     int m_picture = -1;
+    // What follows the alt text of each thumbnail's image element, made once a run.
+    mutable QHash<QString, QByteArray> m_images;
 };
 
 } // namespace zorbin
