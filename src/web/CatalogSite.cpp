@@ -7,6 +7,7 @@
 #include "platform/FileSystem.h"
 #include "platform/Paths.h"
 #include "web/ItemArticle.h"
+#include "web/ItemSpool.h"
 #include "web/SearchIndex.h"
 #include "web/SiteFile.h"
 #include "web/SiteLayout.h"
@@ -19,8 +20,8 @@
 #include "web/ThumbnailStore.h"
 
 #include <QDir>
-#include <QFile>
-#include <numeric>
+#include <cstring>
+#include <map>
 
 namespace zorbin {
 namespace {
@@ -31,20 +32,15 @@ const QSize LogoBox(480, 160);
 // Where the first pass keeps the items it made, in the staging folder.
 const QString SpoolName = QStringLiteral("items.spool");
 
-// One item as the first pass left it in the spool: its article's inside, then the start of
-// its search entry.
-struct SpooledItem
-{
-    qint64 offset = 0;
-    qint32 articleBytes = 0;
-    qint32 entryBytes = 0;
-};
+// An item as the spool holds it: the length of its article's inside, that inside, and the start
+// of its search entry.
+using ArticleLength = qint32;
 
 // One run of the site writer. The first pass reads the catalog rows once, in catalog order,
-// makes the thumbnails and writes each item's article into a spool file, keeping only its place
-// and sort group in memory; the second pass writes the pages in site order (by section, when
-// asked), reading each item back from the spool. So a catalog of any size costs memory only
-// for its count of items, never for their texts.
+// makes the thumbnails and writes each item's article into the spool, in the stream of its
+// section (one stream without sections), keeping only the item's sort group in memory; the
+// second pass writes the pages in site order, reading each section's stream from start to end.
+// So a catalog of any size costs little memory beyond a few bytes an item.
 class SiteRun
 {
 public:
@@ -63,13 +59,16 @@ public:
     {
         if (m_rows.count() == 0)
             return Stop::No;
-        m_spool.setFileName(m_staging.path(SpoolName));
-        if (!m_spool.open(QIODevice::ReadWrite | QIODevice::Truncate))
-            return spoolFailure();
+        auto spool = ItemSpool::create(m_staging.path(SpoolName));
+        if (!spool)
+            return spool.status();
+        m_spool = std::move(spool).value();
         auto spooled = spoolItems();
         if (!spooled || spooled.value() == Stop::Requested)
             return spooled;
-        planOrder();
+        if (m_request.sections)
+            m_sections = planSections(m_groups, m_groupNames);
+        m_groups = {};
         if (m_layout.topBand && !m_layout.logo.isEmpty()) {
             if (const auto logo = m_context.files.findFile(m_layout.logo)) {
                 auto made = m_pictures.thumbnailOf(*logo, LogoBox);
@@ -79,7 +78,7 @@ public:
             }
         }
         auto written = writePages();
-        m_spool.close();
+        m_spool.reset();
         if (!written || written.value() == Stop::Requested)
             return written;
         if (const Status styled = writeFile(site::StylesheetName, siteStylesheet(m_layout)); !styled)
@@ -95,7 +94,7 @@ public:
 private:
     Result<Stop> spoolItems()
     {
-        QByteArray article;
+        QByteArray record;
         QByteArray entry;
         for (long long done = 1; m_rows.next(); ++done) {
             std::optional<Thumbnail> picture;
@@ -105,34 +104,37 @@ private:
                     return found.status();
                 picture = found.value();
             }
-            article.truncate(0);
+            record.resize(sizeof(ArticleLength));
             entry.truncate(0);
-            if (const Status written = m_article.write(picture ? &*picture : nullptr, article, entry);
+            if (const Status written = m_article.write(picture ? &*picture : nullptr, record, entry);
                 !written)
                 return written;
-            m_items.push_back(
-                {m_spool.pos(), static_cast<qint32>(article.size()), static_cast<qint32>(entry.size())});
-            if (m_spool.write(article) != article.size() || m_spool.write(entry) != entry.size())
-                return spoolFailure();
-            if (m_request.sections)
+            const auto articleLength = static_cast<ArticleLength>(record.size() - sizeof(ArticleLength));
+            std::memcpy(record.data(), &articleLength, sizeof articleLength);
+            record += entry;
+            std::size_t stream = 0;
+            if (m_request.sections) {
                 m_groups.push_back(m_article.sortGroup());
+                stream = streamOf(m_groups.back());
+            }
+            if (const Status spooled = m_spool->append(stream, record); !spooled)
+                return spooled;
             if (m_meter.tick(done, m_total))
                 return Stop::Requested;
         }
         if (!m_rows.status())
             return m_rows.status();
-        // The second pass reads the items in site order, here and there in the spool: mapped,
-        // an item is read without a call to the system (two calls an item took longer than
-        // writing the pages). The mapped pages are the system's file cache, not the heap.
-        if (!m_spool.flush())
-            return spoolFailure();
-        m_spool.close();
-        if (!m_spool.open(QIODevice::ReadOnly))
-            return spoolFailure();
-        m_mapped = m_spool.map(0, m_spool.size());
-        if (!m_mapped)
-            return spoolFailure();
+        if (const Status finished = m_spool->finish(); !finished)
+            return finished;
         return Stop::No;
+    }
+
+    // The spool's stream of a section, numbered as the sections first occur in the catalog.
+    std::size_t streamOf(const std::optional<qint64> &group)
+    {
+        const auto [known, added] = m_streams.try_emplace(group, m_streams.size());
+        Q_UNUSED(added);
+        return known->second;
     }
 
     // Each reference is looked up once a run: items share pictures.
@@ -149,20 +151,9 @@ private:
         return made;
     }
 
-    void planOrder()
-    {
-        if (m_request.sections) {
-            m_plan = planSections(m_groups, m_groupNames);
-            m_groups = {};
-            return;
-        }
-        m_plan.order.resize(m_items.size());
-        std::iota(m_plan.order.begin(), m_plan.order.end(), 0);
-    }
-
     Result<Stop> writePages()
     {
-        const auto count = static_cast<long long>(m_items.size());
+        const long long count = m_total / 2;
         const long long perPage = m_layout.itemsPerPage();
         const long long pageCount = (count + perPage - 1) / perPage;
         auto index = SiteFile::create(m_context.files, m_staging.path(site::SearchIndexName));
@@ -180,14 +171,14 @@ private:
             SiteFile &file = *created.value();
             file.writeBytes(pageStart(m_layout, page, m_logo ? &*m_logo : nullptr));
             if (page == 1 && m_request.sections)
-                file.writeBytes(sectionList(m_plan.sections, perPage));
+                file.writeBytes(sectionList(m_sections, perPage));
             file.writeBytes("<main id=\"catalog\">\n");
             bool open = false; // a section's grid, or the page's
             for (long long place = (page - 1) * perPage; place < std::min(count, page * perPage); ++place) {
                 if (m_request.sections) {
-                    while (m_plan.sections[section].first + m_plan.sections[section].count <= place)
+                    while (m_sections[section].first + m_sections[section].count <= place)
                         ++section;
-                    const Section &current = m_plan.sections[section];
+                    const Section &current = m_sections[section];
                     if (open && place == current.first)
                         file.writeBytes("</div>\n</section>\n");
                     if (!open || place == current.first)
@@ -196,15 +187,18 @@ private:
                     file.writeBytes("<div class=\"grid\">\n");
                 }
                 open = true;
-                const SpooledItem &item =
-                    m_items[static_cast<std::size_t>(m_plan.order[static_cast<std::size_t>(place)])];
-                const QByteArrayView bytes(reinterpret_cast<const char *>(m_mapped) + item.offset,
-                                           item.articleBytes + item.entryBytes);
+                const auto record =
+                    m_spool->next(m_request.sections ? streamOf(m_sections[section].group) : 0);
+                if (!record)
+                    return record.status();
+                ArticleLength articleLength = 0;
+                std::memcpy(&articleLength, record->data(), sizeof articleLength);
+                const QByteArrayView article = record->sliced(sizeof articleLength, articleLength);
                 file.writeBytes("<article class=\"item\" id=\"i" + QByteArray::number(place + 1) + "\">\n");
-                file.writeBytes(bytes.first(item.articleBytes));
+                file.writeBytes(article);
                 file.writeBytes("</article>\n");
-                writeSearchEntry(*index.value(), bytes.sliced(item.articleBytes), page, place + 1,
-                                 place == 0);
+                writeSearchEntry(*index.value(), record->sliced(sizeof articleLength + articleLength), page,
+                                 place + 1, place == 0);
                 if (m_meter.tick(count + place + 1, m_total))
                     return Stop::Requested;
             }
@@ -231,12 +225,6 @@ private:
         return created.value()->close();
     }
 
-    Status spoolFailure() const
-    {
-        return Status::fault(QStringLiteral("לא ניתן לכתוב את הקובץ %1: %2")
-                                 .arg(QDir::toNativeSeparators(m_spool.fileName()), m_spool.errorString()));
-    }
-
     RunContext &m_context;
     const SiteRequest &m_request;
     const SiteLayout &m_layout;
@@ -247,11 +235,10 @@ private:
     ItemArticle m_article;
     ProgressMeter m_meter;
     long long m_total = 0; // progress: every item read, then every item written
-    QFile m_spool;
-    const uchar *m_mapped = nullptr;             // the spool, once the first pass has written it
-    std::vector<SpooledItem> m_items;            // in catalog order
-    std::vector<std::optional<qint64>> m_groups; // their sort groups, with sections
-    SectionPlan m_plan;
+    std::unique_ptr<ItemSpool> m_spool;
+    std::vector<std::optional<qint64>> m_groups; // the items' sort groups in catalog order, with sections
+    std::map<std::optional<qint64>, std::size_t> m_streams; // a section's stream in the spool
+    std::vector<Section> m_sections;
     QHash<QString, Thumbnail> m_thumbnails; // picture reference -> its thumbnail
     std::optional<Thumbnail> m_logo;
     QStringList m_staged;

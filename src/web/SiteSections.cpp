@@ -3,8 +3,7 @@
 #include "workdb/WorkDatabase.h"
 
 #include <QSqlError>
-#include <algorithm>
-#include <numeric>
+#include <map>
 
 namespace zorbin {
 
@@ -13,35 +12,29 @@ QString Section::anchor() const
     return group ? QStringLiteral("s-") + QString::number(*group) : QStringLiteral("s-none");
 }
 
-SectionPlan planSections(const std::vector<std::optional<qint64>> &groups,
-                         const QHash<qint64, QString> &names)
+std::vector<Section> planSections(const std::vector<std::optional<qint64>> &groups,
+                                  const QHash<qint64, QString> &names)
 {
-    SectionPlan plan;
-    plan.order.resize(groups.size());
-    std::iota(plan.order.begin(), plan.order.end(), 0);
-    // Nothing (no sort group) after every code; stable, so a section keeps the catalog's order.
-    std::stable_sort(plan.order.begin(), plan.order.end(), [&](qint64 a, qint64 b) {
-        const auto &left = groups[static_cast<std::size_t>(a)];
-        const auto &right = groups[static_cast<std::size_t>(b)];
-        if (left.has_value() != right.has_value())
-            return left.has_value();
-        return left.has_value() && *left < *right;
-    });
-    for (std::size_t n = 0; n < plan.order.size(); ++n) {
-        const auto &group = groups[static_cast<std::size_t>(plan.order[n])];
-        if (plan.sections.empty() || plan.sections.back().group != group) {
-            Section section;
-            section.group = group;
-            section.first = static_cast<long long>(n);
-            if (!group)
-                section.title = QStringLiteral("ללא קבוצת מיון");
-            else if (section.title = names.value(*group); section.title.trimmed().isEmpty())
-                section.title = QStringLiteral("קבוצת מיון ") + QString::number(*group);
-            plan.sections.push_back(section);
-        }
-        ++plan.sections.back().count;
+    // Keyed so that the codes come in order and no sort group after them.
+    std::map<std::pair<bool, qint64>, long long> counts;
+    for (const std::optional<qint64> &group : groups)
+        ++counts[{!group.has_value(), group.value_or(0)}];
+    std::vector<Section> sections;
+    long long first = 0;
+    for (const auto &[key, count] : counts) {
+        Section section;
+        if (!key.first)
+            section.group = key.second;
+        section.first = first;
+        section.count = count;
+        if (!section.group)
+            section.title = QStringLiteral("ללא קבוצת מיון");
+        else if (section.title = names.value(key.second); section.title.trimmed().isEmpty())
+            section.title = QStringLiteral("קבוצת מיון ") + QString::number(key.second);
+        sections.push_back(section);
+        first += count;
     }
-    return plan;
+    return sections;
 }
 
 Result<QHash<qint64, QString>> readSortGroupNames(const QString &dbFile)

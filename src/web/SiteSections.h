@@ -21,18 +21,12 @@ struct Section
     QString anchor() const;
 };
 
-// The site's order of the items: the sections in sort-code order, the items without a sort
-// group last, and inside each section the items in the catalog's order.
-struct SectionPlan
-{
-    std::vector<qint64> order;     // order[n] is the catalog place (from 0) of the site's item n
-    std::vector<Section> sections; // in site order
-};
-
-// `groups[i]` is the sort group of the catalog's item i; `names` the names of the sort groups.
-// A group without a name (none stored, or an empty one) is titled by its code.
-SectionPlan planSections(const std::vector<std::optional<qint64>> &groups,
-                         const QHash<qint64, QString> &names);
+// The sections of the catalog's items in site order: in sort-code order, the items without a
+// sort group last. `groups[i]` is the sort group of the catalog's item i (its items keep the
+// catalog's order inside their section); `names` the names of the sort groups. A group without
+// a name (none stored, or blanks) is titled by its code.
+std::vector<Section> planSections(const std::vector<std::optional<qint64>> &groups,
+                                  const QHash<qint64, QString> &names);
 
 // The sort groups' names of the working database (tItemSort): code to name, a null name as
 // the empty text. Fails with the engine's description.

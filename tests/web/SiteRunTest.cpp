@@ -10,6 +10,7 @@
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
 #include "web/CatalogSite.h"
+#include "web/ItemSpool.h"
 #include "web/SiteNames.h"
 #include "web/SiteSections.h"
 
@@ -211,18 +212,41 @@ private Q_SLOTS:
                  (QStringList{QStringLiteral("notes.txt"), QStringLiteral("pictures/thumbnails.txt")}));
     }
 
+    // Enough records in three streams to fill blocks and pass the limit of waiting records,
+    // read back two streams alternately, then the third.
+    void spoolReadsEachStreamInOrder()
+    {
+        auto spool = ItemSpool::create(m_dir.filePath(QStringLiteral("test.spool")));
+        QVERIFY(spool);
+        std::array<QList<QByteArray>, 3> streams;
+        for (int n = 0; n < 6000; ++n) {
+            const std::size_t stream = n % 7 == 0 ? 2 : n % 2;
+            streams[stream] << QByteArray(100 + (n * 37) % 3000, char('a' + stream)) + QByteArray::number(n);
+            QVERIFY(spool.value()->append(stream, streams[stream].last()).isOk());
+        }
+        QVERIFY(spool.value()->finish().isOk());
+        for (qsizetype n = 0; n < std::max(streams[0].size(), streams[1].size()); ++n) {
+            for (std::size_t stream : {0, 1}) {
+                if (n < streams[stream].size())
+                    QCOMPARE(spool.value()->next(stream).value().toByteArray(), streams[stream][n]);
+            }
+        }
+        for (const QByteArray &expected : streams[2])
+            QCOMPARE(spool.value()->next(2).value().toByteArray(), expected);
+        QVERIFY(!spool.value()->next(2));
+    }
+
     void sectionsInSortCodeOrder()
     {
-        const std::vector<std::optional<qint64>> groups = {3, {}, 1, 3, 1, {}};
-        const SectionPlan plan =
-            planSections(groups, {{1, QStringLiteral("Lamps")}, {3, QStringLiteral(" ")}});
-        QCOMPARE(plan.order, (std::vector<qint64>{2, 4, 0, 3, 1, 5}));
-        QCOMPARE(plan.sections.size(), std::size_t(3));
-        QCOMPARE(plan.sections[0].title, QStringLiteral("Lamps"));
-        QCOMPARE(plan.sections[1].title, QStringLiteral("קבוצת מיון 3"));
-        QCOMPARE(plan.sections[2].anchor(), QStringLiteral("s-none"));
-        QCOMPARE(plan.sections[2].first, 4);
-        QCOMPARE(plan.sections[2].count, 2);
+        const std::vector<Section> sections =
+            planSections({3, {}, 1, 3, 1, {}}, {{1, QStringLiteral("Lamps")}, {3, QStringLiteral(" ")}});
+        QCOMPARE(sections.size(), std::size_t(3));
+        QCOMPARE(sections[0].title, QStringLiteral("Lamps"));
+        QCOMPARE(sections[1].title, QStringLiteral("קבוצת מיון 3"));
+        QCOMPARE(sections[1].first, 2);
+        QCOMPARE(sections[2].anchor(), QStringLiteral("s-none"));
+        QCOMPARE(sections[2].first, 4);
+        QCOMPARE(sections[2].count, 2);
     }
 };
 
