@@ -19,7 +19,6 @@
 #include "web/SiteStyle.h"
 #include "web/ThumbnailStore.h"
 
-#include <QDir>
 #include <cstring>
 #include <map>
 
@@ -64,7 +63,7 @@ public:
             return spool.status();
         m_spool = std::move(spool).value();
         auto spooled = spoolItems();
-        if (!spooled || spooled.value() == Stop::Requested)
+        if (!spooled || spooled.value() == Stop::Requested || m_count == 0)
             return spooled;
         if (m_request.sections)
             m_sections = planSections(m_groups, m_groupNames);
@@ -96,7 +95,7 @@ private:
     {
         QByteArray record;
         QByteArray entry;
-        for (long long done = 1; m_rows.next(); ++done) {
+        while (m_rows.next()) {
             std::optional<Thumbnail> picture;
             if (const QString reference = m_article.pictureReference(); !reference.isEmpty()) {
                 auto found = pictureOf(reference);
@@ -119,7 +118,7 @@ private:
             }
             if (const Status spooled = m_spool->append(stream, record); !spooled)
                 return spooled;
-            if (m_meter.tick(done, m_total))
+            if (m_meter.tick(++m_count, m_total))
                 return Stop::Requested;
         }
         if (!m_rows.status())
@@ -153,15 +152,13 @@ private:
 
     Result<Stop> writePages()
     {
-        const long long count = m_total / 2;
         const long long perPage = m_layout.itemsPerPage();
-        const long long pageCount = (count + perPage - 1) / perPage;
+        const long long pageCount = (m_count + perPage - 1) / perPage;
         auto index = SiteFile::create(m_context.files, m_staging.path(site::SearchIndexName));
         if (!index)
             return index.status();
         m_staged << site::SearchIndexName;
         writeSearchIndexStart(*index.value());
-        std::size_t section = 0;
         for (long long page = 1; page <= pageCount; ++page) {
             const QString name = site::pageFileName(page);
             auto created = SiteFile::create(m_context.files, m_staging.path(name));
@@ -173,38 +170,24 @@ private:
             if (page == 1 && m_request.sections)
                 file.writeBytes(sectionList(m_sections, perPage));
             file.writeBytes("<main id=\"catalog\">\n");
-            bool open = false; // a section's grid, or the page's
-            for (long long place = (page - 1) * perPage; place < std::min(count, page * perPage); ++place) {
-                if (m_request.sections) {
-                    while (m_sections[section].first + m_sections[section].count <= place)
-                        ++section;
-                    const Section &current = m_sections[section];
-                    if (open && place == current.first)
-                        file.writeBytes("</div>\n</section>\n");
-                    if (!open || place == current.first)
-                        file.writeBytes(sectionStart(current));
-                } else if (!open) {
-                    file.writeBytes("<div class=\"grid\">\n");
-                }
-                open = true;
+            const long long first = (page - 1) * perPage;
+            for (long long place = first; place < std::min(m_count, page * perPage); ++place) {
+                startGroup(file, place, place == first);
                 const auto record =
-                    m_spool->next(m_request.sections ? streamOf(m_sections[section].group) : 0);
+                    m_spool->next(m_request.sections ? streamOf(m_sections[m_section].group) : 0);
                 if (!record)
                     return record.status();
                 ArticleLength articleLength = 0;
                 std::memcpy(&articleLength, record->data(), sizeof articleLength);
-                const QByteArrayView article = record->sliced(sizeof articleLength, articleLength);
                 file.writeBytes("<article class=\"item\" id=\"i" + QByteArray::number(place + 1) + "\">\n");
-                file.writeBytes(article);
+                file.writeBytes(record->sliced(sizeof articleLength, articleLength));
                 file.writeBytes("</article>\n");
                 writeSearchEntry(*index.value(), record->sliced(sizeof articleLength + articleLength), page,
                                  place + 1, place == 0);
-                if (m_meter.tick(count + place + 1, m_total))
+                if (m_meter.tick(m_count + place + 1, m_total))
                     return Stop::Requested;
             }
-            if (open)
-                file.writeBytes(m_request.sections ? "</div>\n</section>\n" : "</div>\n");
-            file.writeBytes("</main>\n");
+            file.writeBytes(m_request.sections ? "</div>\n</section>\n</main>\n" : "</div>\n</main>\n");
             file.writeBytes(pageEnd(m_layout, page, pageCount));
             if (const Status closed = file.close(); !closed)
                 return closed;
@@ -213,6 +196,24 @@ private:
         if (const Status closed = index.value()->close(); !closed)
             return closed;
         return Stop::No;
+    }
+
+    // Opens the grid that the item at `place` goes into: the page's, or with sections its
+    // section's under its heading, at the start of a section and again on each page it spans.
+    void startGroup(SiteFile &file, long long place, bool pageStart)
+    {
+        if (!m_request.sections) {
+            if (pageStart)
+                file.writeBytes("<div class=\"grid\">\n");
+            return;
+        }
+        while (m_sections[m_section].first + m_sections[m_section].count <= place)
+            ++m_section;
+        const Section &current = m_sections[m_section];
+        if (!pageStart && place == current.first)
+            file.writeBytes("</div>\n</section>\n");
+        if (pageStart || place == current.first)
+            file.writeBytes(sectionStart(current));
     }
 
     Status writeFile(const QString &name, QByteArrayView bytes)
@@ -235,10 +236,12 @@ private:
     ItemArticle m_article;
     ProgressMeter m_meter;
     long long m_total = 0; // progress: every item read, then every item written
+    long long m_count = 0; // the items read
     std::unique_ptr<ItemSpool> m_spool;
     std::vector<std::optional<qint64>> m_groups; // the items' sort groups in catalog order, with sections
     std::map<std::optional<qint64>, std::size_t> m_streams; // a section's stream in the spool
     std::vector<Section> m_sections;
+    std::size_t m_section = 0;              // the section being written
     QHash<QString, Thumbnail> m_thumbnails; // picture reference -> its thumbnail
     std::optional<Thumbnail> m_logo;
     QStringList m_staged;

@@ -6,6 +6,7 @@
 
 #include <QDir>
 #include <QFile>
+#include <QFileInfo>
 #include <QSet>
 #include <filesystem>
 #include <system_error>
@@ -33,8 +34,12 @@ Result<SiteStaging> SiteStaging::prepare(const QString &siteFolder)
 {
     const QString folder = withTrailingSeparator(siteFolder);
     const QString staging = folder + site::StagingFolderName;
-    QDir leftover(staging);
-    if (leftover.exists() && !leftover.removeRecursively())
+    // A link of that name goes, not what it leads to.
+    const QFileInfo leftover(staging);
+    const bool removed = leftover.isSymLink() || leftover.isFile() ? QFile::remove(staging)
+                         : leftover.isDir()                        ? QDir(staging).removeRecursively()
+                                                                   : true;
+    if (!removed)
         return Status::fault(
             QStringLiteral("לא ניתן למחוק את המחיצה %1.").arg(QDir::toNativeSeparators(staging)));
     if (!QDir().mkdir(staging))

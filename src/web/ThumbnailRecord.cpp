@@ -4,6 +4,8 @@
 #include <QFile>
 #include <QRegularExpression>
 #include <QSaveFile>
+#include <algorithm>
+#include <array>
 
 namespace zorbin {
 namespace {
@@ -25,15 +27,15 @@ ThumbnailRecord readThumbnailRecord(const QString &path)
         const QStringList fields = line.split(QLatin1Char('\t'));
         if (fields.size() != FieldCount || !hex.match(fields[0]).hasMatch())
             continue;
-        bool numbers[5] = {};
+        std::array<bool, 5> numbers{};
         RecordedThumbnail entry;
         entry.bytes = fields[1].toLongLong(&numbers[0]);
         entry.modified = fields[2].toLongLong(&numbers[1]);
         entry.name = fields[3];
         entry.size = QSize(fields[4].toInt(&numbers[2]), fields[5].toInt(&numbers[3]));
         entry.twice = fields[6].toInt(&numbers[4]) == 1;
-        if (std::find(std::begin(numbers), std::end(numbers), false) != std::end(numbers) ||
-            entry.size.isEmpty() || (!entry.name.isEmpty() && !hex.match(entry.name).hasMatch()))
+        if (!std::ranges::all_of(numbers, [](bool number) { return number; }) || entry.size.isEmpty() ||
+            (!entry.name.isEmpty() && !hex.match(entry.name).hasMatch()))
             continue;
         record.insert(fields[0], entry);
     }

@@ -212,6 +212,20 @@ private Q_SLOTS:
                  (QStringList{QStringLiteral("notes.txt"), QStringLiteral("pictures/thumbnails.txt")}));
     }
 
+    // A staging folder left as a link to elsewhere: the link goes, what it leads to stays.
+    void stagingLinkLeavesItsTarget()
+    {
+        const QString elsewhere = m_dir.filePath(QStringLiteral("elsewhere"));
+        QVERIFY(QDir().mkpath(elsewhere) && QDir().mkpath(site()));
+        test::writeFile(elsewhere + QStringLiteral("/keep.txt"));
+        QFile::remove(site() + QStringLiteral("/.zorbin-staging"));
+        QVERIFY(QFile::link(elsewhere, site() + QStringLiteral("/.zorbin-staging")));
+        SiteContext run;
+        QVERIFY(write(run).isOk());
+        QVERIFY(QFile::exists(elsewhere + QStringLiteral("/keep.txt")));
+        QVERIFY(!QFileInfo::exists(site() + QStringLiteral("/.zorbin-staging")));
+    }
+
     // Enough records in three streams to fill blocks and pass the limit of waiting records,
     // read back two streams alternately, then the third.
     void spoolReadsEachStreamInOrder()
