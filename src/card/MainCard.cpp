@@ -82,6 +82,7 @@ QLayout *MainCard::buildCommands()
     m_cmdRunMailing = button("cmdRunMailing", QStringLiteral("הצג קטלוג"));
     m_CmdPreview = button("CmdPreview", QStringLiteral("הצג רשימה"));
     m_cmdRunPdf = button("cmdRunPdf", QStringLiteral("הצג PDF"));
+    m_cmdRunSite = button("cmdRunSite", QStringLiteral("הצג אתר"));
     m_cmdStop = button("cmdStop", QStringLiteral("עצור"));
     m_CmdDef = button("CmdDef", QStringLiteral("שמור הגדרות"));
     m_cmdRunMailing->setDefault(true);
@@ -90,6 +91,7 @@ QLayout *MainCard::buildCommands()
     connect(m_cmdRunMailing, &QPushButton::clicked, this, &MainCard::cmdRunMailing_Click);
     connect(m_CmdPreview, &QPushButton::clicked, this, &MainCard::CmdPreview_Click);
     connect(m_cmdRunPdf, &QPushButton::clicked, this, &MainCard::cmdRunPdf_Click);
+    connect(m_cmdRunSite, &QPushButton::clicked, this, &MainCard::cmdRunSite_Click);
     connect(m_cmdStop, &QPushButton::clicked, this, &MainCard::cmdStop_Click);
     connect(m_CmdDef, &QPushButton::clicked, this, &MainCard::CmdDef_Click);
 
@@ -97,6 +99,7 @@ QLayout *MainCard::buildCommands()
     buttons->addWidget(m_cmdRunMailing);
     buttons->addWidget(m_CmdPreview);
     buttons->addWidget(m_cmdRunPdf);
+    buttons->addWidget(m_cmdRunSite);
     buttons->addWidget(m_cmdStop);
     buttons->addStretch();
     buttons->addWidget(m_CmdDef);
@@ -116,6 +119,11 @@ void MainCard::CmdPreview_Click()
 void MainCard::cmdRunPdf_Click()
 {
     m_control.askAndMakePdf();
+}
+
+void MainCard::cmdRunSite_Click()
+{
+    m_control.askAndMakeSite();
 }
 
 void MainCard::cmdStop_Click()
@@ -143,6 +151,7 @@ void MainCard::setBusy(bool busy)
     m_cmdRunMailing->setEnabled(!busy);
     m_CmdPreview->setEnabled(!busy);
     m_cmdRunPdf->setEnabled(!busy);
+    m_cmdRunSite->setEnabled(!busy);
     m_CmdDef->setEnabled(!busy);
     m_cmdStop->setEnabled(busy);
     // The runs read the settings as they go: they stay as they were until the run ends.

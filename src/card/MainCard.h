@@ -68,6 +68,7 @@ private Q_SLOTS:
     void cmdRunMailing_Click();
     void CmdPreview_Click();
     void cmdRunPdf_Click();
+    void cmdRunSite_Click();
     void cmdStop_Click();
     void CmdDef_Click();
 
@@ -84,6 +85,7 @@ private:
     QPushButton *m_cmdRunMailing = nullptr;
     QPushButton *m_CmdPreview = nullptr;
     QPushButton *m_cmdRunPdf = nullptr;
+    QPushButton *m_cmdRunSite = nullptr;
     QPushButton *m_cmdStop = nullptr;
     QPushButton *m_CmdDef = nullptr;
     QLabel *m_Message1 = nullptr;

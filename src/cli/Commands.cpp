@@ -115,13 +115,13 @@ int finish(const RunOutcome &outcome)
 // What a run command asks for.
 struct RunRequest
 {
-    enum class Output { Catalog, List, Pdf };
+    enum class Output { Catalog, List, Pdf, Site };
     Output output = Output::Catalog;
     bool useMarked = false;
     bool onlyWithPicture = false;
     bool open = false;
     QString outputFolder; // empty: the settings' own
-    QString file;         // the PDF: empty for the one in the output folder
+    QString file;         // the PDF or the site's folder: empty for the one in the output folder
     PdfPageSize pageSize = PdfPageSize::A4;
 };
 
@@ -156,6 +156,8 @@ int runOutput(SettingsStore &store, const RunRequest &request)
         return finish(control->makeList(!request.useMarked));
     case RunRequest::Output::Pdf:
         return finish(control->makePdf(request.pageSize, request.file));
+    case RunRequest::Output::Site:
+        return finish(control->makeSite(request.file));
     }
     return Failure;
 }
@@ -232,6 +234,26 @@ int pdf(const QStringList &arguments)
     return runOutput(*store, request);
 }
 
+// The web catalog: collects (unless the items were marked by hand) and writes the site.
+int web(const QStringList &arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        QStringLiteral("Writes the web catalog and prints the path of its first page."));
+    addRunOptions(parser);
+    parser.addOption({OutOption, QStringLiteral("The site's folder (default: site in the output folder)."),
+                      QStringLiteral("DIR")});
+    if (const auto exit = parse(parser, arguments))
+        return *exit;
+    if (const auto exit = checkSettingsFile(parser))
+        return *exit;
+    RunRequest request = requestOf(RunRequest::Output::Site, parser);
+    if (parser.isSet(OutOption))
+        request.file = QFileInfo(parser.value(OutOption)).absoluteFilePath();
+    auto store = openStore(parser);
+    return runOutput(*store, request);
+}
+
 int sql(const QStringList &arguments)
 {
     QCommandLineParser parser;
@@ -268,6 +290,7 @@ QString overview()
                           "  catalog   write the catalog and print the path of its first page\n"
                           "  list      write the plain item list and print its path\n"
                           "  pdf       write the catalog as a PDF file and print its path\n"
+                          "  web       write the web catalog and print the path of its first page\n"
                           "  demo      write the catalog of the bundled demo database\n"
                           "  sql       print every statement a run would send\n"
                           "\n"
@@ -282,6 +305,8 @@ int run(const QString &command, const QStringList &arguments)
         return catalogOrList(RunRequest::Output::List, arguments);
     if (command == QLatin1String("pdf"))
         return pdf(arguments);
+    if (command == QLatin1String("web"))
+        return web(arguments);
     if (command == QLatin1String("demo"))
         return demo(arguments);
     if (command == QLatin1String("sql"))

@@ -176,6 +176,20 @@ RunOutcome CatalogControl::makePdf(PdfPageSize pageSize, const QString &file)
         [this, pageSize, &file](RunOutcome outcome) { return writePdf(outcome, pageSize, file); });
 }
 
+RunOutcome CatalogControl::askAndMakeSite()
+{
+    if (m_running)
+        return {};
+    if (m_user.ask(CatalogQuestion, CatalogQuestionTitle, QuestionButtons::YesNo) != Answer::Yes)
+        return {};
+    return makeSite();
+}
+
+RunOutcome CatalogControl::makeSite(const QString &folder)
+{
+    return makeCatalogWith([this, &folder](RunOutcome outcome) { return writeSite(outcome, folder); });
+}
+
 RunOutcome CatalogControl::makeCatalogWith(const std::function<RunOutcome(RunOutcome)> &write)
 {
     if (m_running)
@@ -219,31 +233,58 @@ RunOutcome CatalogControl::CreateCatalog(RunOutcome outcome)
     return show(page.value(), outcome);
 }
 
+Result<QString> CatalogControl::inOutputFolder(const QString &given, const QString &name)
+{
+    if (!given.isEmpty())
+        return given;
+    const QString folder = outputFolderOf(m_settings);
+    if (const Status made = ensureFolder(m_files, folder); !made)
+        return made;
+    return folder + name;
+}
+
 RunOutcome CatalogControl::writePdf(RunOutcome outcome, PdfPageSize pageSize, const QString &file)
 {
-    QString target = file;
-    if (target.isEmpty()) {
-        const QString folder = outputFolderOf(m_settings);
-        if (const Status made = ensureFolder(m_files, folder); !made)
-            return fail(made);
-        target = folder + PdfFileName;
-    }
+    const Result<QString> target = inOutputFolder(file, PdfFileName);
+    if (!target)
+        return fail(target.status());
     const Result<PdfWritten> written =
-        m_stages->CreateCatPDF(m_context, {target, m_state.WorkDBFile, pageSize});
+        m_stages->CreateCatPDF(m_context, {target.value(), m_state.WorkDBFile, pageSize});
     if (!written)
         return fail(written.status());
     switch (written->ending) {
     case PdfWritten::Ending::NoItems:
         return noItems(outcome);
     case PdfWritten::Ending::Stopped:
-        // Nothing half-written is shown; an older PDF stays as it was.
-        if (outcome.ending == RunOutcome::Ending::Complete)
-            outcome.ending = RunOutcome::Ending::Stopped;
-        return outcome;
+        return stopped(outcome);
     case PdfWritten::Ending::Written:
         break;
     }
     return show(written->file, outcome);
+}
+
+RunOutcome CatalogControl::writeSite(RunOutcome outcome, const QString &folder)
+{
+    const Result<QString> target = inOutputFolder(folder, SiteFolderName);
+    if (!target)
+        return fail(target.status());
+    const Result<QString> first =
+        m_stages->CreateCatSite(m_context, {target.value(), m_state.WorkDBFile, m_settings.webSections});
+    if (!first)
+        return fail(first.status());
+    if (m_state.StopRequested)
+        return stopped(outcome);
+    if (first->isEmpty())
+        return noItems(outcome);
+    return show(first.value(), outcome);
+}
+
+RunOutcome CatalogControl::stopped(RunOutcome outcome)
+{
+    // Nothing half-written is shown; what an earlier run wrote stays as it was.
+    if (outcome.ending == RunOutcome::Ending::Complete)
+        outcome.ending = RunOutcome::Ending::Stopped;
+    return outcome;
 }
 
 RunOutcome CatalogControl::noItems(RunOutcome outcome)

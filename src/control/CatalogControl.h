@@ -66,6 +66,11 @@ public:
     // Collects unless the items are marked by hand, writes the catalog as a PDF into `file`
     // (empty: PdfFileName in the output folder) and opens it.
     RunOutcome makePdf(PdfPageSize pageSize, const QString &file = {});
+    // The web catalog: asks, then makeSite() into the output folder.
+    RunOutcome askAndMakeSite();
+    // Collects unless the items are marked by hand, writes the web catalog into `folder`
+    // (empty: SiteFolderName in the output folder) and opens its first page.
+    RunOutcome makeSite(const QString &folder = {});
     // Collects when asked to, writes the item list and opens it.
     RunOutcome makeList(bool collectAnew);
     // A collection on its own.
@@ -87,6 +92,11 @@ private:
     RunOutcome makeCatalogWith(const std::function<RunOutcome(RunOutcome)> &write);
     RunOutcome CreateCatalog(RunOutcome outcome);
     RunOutcome writePdf(RunOutcome outcome, PdfPageSize pageSize, const QString &file);
+    RunOutcome writeSite(RunOutcome outcome, const QString &folder);
+    // `given`, or `name` in the output folder, which is made when it is missing.
+    Result<QString> inOutputFolder(const QString &given, const QString &name);
+    // Ends a run whose writer was stopped: nothing new is shown.
+    RunOutcome stopped(RunOutcome outcome);
     // The catalog query had no rows: the user is told, and nothing is shown.
     RunOutcome noItems(RunOutcome outcome);
     RunOutcome fail(const Status &status);

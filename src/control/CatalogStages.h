@@ -2,6 +2,7 @@
 
 #include "common/Status.h"
 #include "pdf/CatalogPdf.h"
+#include "web/CatalogSite.h"
 #include "workdb/CollectionRun.h"
 
 #include <QString>
@@ -36,6 +37,8 @@ public:
     virtual Status CreateListHTML(RunContext &context, const QString &fileName, const QString &dbFile) = 0;
     // Writes the catalog as a PDF (CatalogPdf.h).
     virtual Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request) = 0;
+    // Writes the web catalog (CatalogSite.h): its first page, or the empty text.
+    virtual Result<QString> CreateCatSite(RunContext &context, const SiteRequest &request) = 0;
 };
 
 } // namespace zorbin

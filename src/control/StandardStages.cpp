@@ -53,6 +53,10 @@ public:
     {
         return zorbin::CreateCatPDF(context, request);
     }
+    Result<QString> CreateCatSite(RunContext &context, const SiteRequest &request) override
+    {
+        return zorbin::CreateCatSite(context, request);
+    }
 
 private:
     SettingsStore &m_store;

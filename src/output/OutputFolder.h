@@ -16,6 +16,7 @@ inline const QString StylesheetName = QStringLiteral("tarnik.css");
 inline const QString ListPageName = QStringLiteral("zorbin3.htm");
 inline const QString ImagesFolderName = QStringLiteral("images");
 inline const QString PdfFileName = QStringLiteral("zorbin.pdf");
+inline const QString SiteFolderName = QStringLiteral("site");
 
 // The output folder of the settings, with a separator at its end: `txtPagingPath`, or the
 // temporary folder when that is empty.

@@ -58,6 +58,28 @@ class BrowserTest : public QObject
     Q_OBJECT
 
 private:
+    QTemporaryDir m_webWork;
+    QString m_site; // the first page of the demo's web catalog, once written
+
+    // Writes the demo's web catalog through the command line, once for all widths.
+    QString demoSite()
+    {
+        if (!m_site.isEmpty())
+            return m_site;
+        QProcess cli;
+        QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+        environment.insert(QStringLiteral("TMPDIR"), m_webWork.path());
+        cli.setProcessEnvironment(environment);
+        cli.start(QStringLiteral(ZORBIN_CLI),
+                  {QStringLiteral("web"), QStringLiteral("--settings"),
+                   test::demoFolder() + QStringLiteral("/demo-settings.ini"), QStringLiteral("--out"),
+                   m_webWork.filePath(QStringLiteral("site"))});
+        if (!cli.waitForFinished(300000) || cli.exitCode() != 0)
+            qWarning("zorbin-cli web failed: %s", cli.readAllStandardError().constData());
+        m_site = QString::fromLocal8Bit(cli.readAllStandardOutput()).trimmed();
+        return m_site;
+    }
+
     // Every picture of the page whose file exists has loaded; the others are the demo's
     // deliberately missing pictures. Returns how many loaded.
     static int checkPictures(const QJsonObject &page)
@@ -144,6 +166,55 @@ private Q_SLOTS:
         QCOMPARE(second[QStringLiteral("cells")].toInt(), cells);
         QCOMPARE(linkTo(second, PreviousPage), firstPage);
         QCOMPARE(checkPictures(second), existingPictures(second));
+    }
+
+    // The demo's web catalog on a phone and on a wide screen.
+    void webCatalog_data()
+    {
+        const QSettings demo(test::demoFolder() + QStringLiteral("/demo-settings.ini"), QSettings::IniFormat);
+        QTest::addColumn<QSize>("window");
+        QTest::addColumn<int>("columns");
+        QTest::newRow("phone") << QSize(390, 844) << 1;
+        QTest::newRow("wide") << QSize(1280, 800) << demo.value(QStringLiteral("Params/Cols")).toInt();
+    }
+    void webCatalog()
+    {
+        QFETCH(QSize, window);
+        QFETCH(int, columns);
+        const QString first = demoSite();
+        QCOMPARE(first, m_webWork.filePath(QStringLiteral("site/index.html")));
+        // A key of an item on another page: the search covers the whole catalog.
+        const QString key = QStringLiteral("B0009");
+        const QJsonObject findings = test::HeadlessChromium(m_webWork.filePath(QStringLiteral("profile")))
+                                         .inspectSite(first, m_webWork.path(), window, key);
+        QVERIFY2(!findings.contains(QStringLiteral("error")),
+                 qPrintable(findings.value(QStringLiteral("error")).toString()));
+        QCOMPARE(findings[QStringLiteral("characterSet")].toString(), QStringLiteral("UTF-8"));
+        QCOMPARE(findings[QStringLiteral("dir")].toString(), QStringLiteral("rtl"));
+        QVERIFY(findings[QStringLiteral("scrollWidth")].toInt() <=
+                findings[QStringLiteral("clientWidth")].toInt());
+        QCOMPARE(findings[QStringLiteral("columns")].toInt(), columns);
+        const QJsonArray images = findings[QStringLiteral("images")].toArray();
+        QVERIFY(images.size() > 1);
+        for (const QJsonValue image : images)
+            QVERIFY2(image[QStringLiteral("naturalWidth")].toInt() > 0,
+                     qPrintable(image[QStringLiteral("src")].toString()));
+        const QJsonArray found = findings[QStringLiteral("found")].toArray();
+        QCOMPARE(found.size(), 1);
+        QVERIFY(found.at(0).toString().contains(key));
+        // Links to sections on this page find their heading; the last leads to its own page.
+        const QJsonArray links = findings[QStringLiteral("sectionLinks")].toArray();
+        QVERIFY(links.size() > 1);
+        for (const QJsonValue link : links) {
+            const QString href = link[QStringLiteral("href")].toString();
+            if (href.startsWith(QLatin1Char('#')))
+                QCOMPARE(link[QStringLiteral("target")].toString(), href.mid(1));
+        }
+        const QJsonObject last = findings[QStringLiteral("lastSection")].toObject();
+        QVERIFY(last[QStringLiteral("location")].toString().endsWith(
+            links.last()[QStringLiteral("href")].toString()));
+        QCOMPARE(last[QStringLiteral("heading")].toString(), links.last()[QStringLiteral("text")].toString());
+        QCOMPARE(findings[QStringLiteral("console")].toArray(), QJsonArray());
     }
 
     void picturesWithMarksInTheirNames()

@@ -66,6 +66,17 @@ public:
         return pdfWritten;
     }
 
+    Result<QString> CreateCatSite(RunContext &context, const SiteRequest &request) override
+    {
+        record(context,
+               QStringLiteral("CreateCatSite(%1,%2,%3)")
+                   .arg(request.folder, request.dbFile,
+                        request.sections ? QStringLiteral("sections") : QStringLiteral("no sections")));
+        if (!siteResult)
+            return siteResult;
+        return siteFirstPage;
+    }
+
     // The calls without their arguments, e.g. "CreateCSS".
     QStringList names() const
     {
@@ -85,6 +96,8 @@ public:
     Status cssResult;
     Status listResult;
     Status pdfResult;
+    Status siteResult;
+    QString siteFirstPage = QStringLiteral("/out/site/index.html");
     PdfWritten pdfWritten{PdfWritten::Ending::Written, QStringLiteral("/out/zorbin.pdf"), 1, 0, 0};
     // Stage name (e.g. "BuildAndCollectData") -> what happens inside it.
     std::function<void(const QString &stage)> during;
