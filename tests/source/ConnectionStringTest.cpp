@@ -82,8 +82,6 @@ const struct Masked
     {"ODBC empty", "server=s;pwd=;database=d", "server=s;pwd=;database=d"},
     {"OLE DB", "Provider=sqloledb;User Id=u;Password=\"x;y\";Initial Catalog=d",
      "Provider=sqloledb;User Id=u;Password=****;Initial Catalog=d"},
-    {"file", "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=/data/a.mdb",
-     "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=/data/a.mdb"},
 };
 
 // The type is stored as the list index of the connection dialog; a stored text that is not a
@@ -93,14 +91,12 @@ const struct StoredType
     const char *name, *stored;
     int type;
 } StoredTypes[] = {
-    {"ODBC", "0", 1},
     {"file", "2", 3},
     {"none chosen", "-1", 0},
     {"half rounds to even, up", "0.5", 2},
     {"half rounds to even, down", "1.5", 2},
     {"blanks around", " 1 ", 2},
     {"not a number", "ODBC", 9},
-    {"empty", "", 9},
     {"largest", "32766", 32767},
     {"beyond 16 bits", "32767", 9},
     {"smallest", "-32769", -32768},

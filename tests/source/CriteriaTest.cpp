@@ -60,8 +60,6 @@ const struct Refusal
 } Refusals[] = {
     {"letters", "abc", "", "\"מקוד מיון\" של טווח קודי המיון כתוב \"abc\""},
     {"fraction", "1", "2.5", "\"עד קוד מיון\" של טווח קודי המיון כתוב \"2.5\""},
-    {"inner blank", "1 0", "", "\"מקוד מיון\" של טווח קודי המיון כתוב \"1 0\""},
-    {"a second condition", " 1 Or 1=1", "", "כתוב \"1 Or 1=1\""},
     {"a second statement", "", "5; DELETE FROM Items", "כתוב \"5; DELETE FROM Items\""},
 };
 
