@@ -2,279 +2,184 @@
 
 #include "platform/Paths.h"
 #include "source/ConnectionStore.h"
+#include "testutil/CaseTable.h"
+#include "testutil/EdgeOfMemory.h"
 #include "testutil/MemorySettingsStore.h"
 #include "testutil/TestMain.h"
 
-#include <QTest>
-
 using namespace zorbin;
 using namespace zorbin::test;
+using namespace Qt::Literals::StringLiterals;
 
+namespace {
+
+// The strings of each connection type (a file path written with "/" for the platform's separator).
+const struct Built
+{
+    const char *name, *server, *user, *password, *database;
+    int type;
+    const char *expected;
+} Builds[] = {
+    {"ODBC", "s", "u", "p", "d", 1, "driver={SQL Server};server=s;uid=u;pwd=p;database=d"},
+    {"ODBC ;", "s", "u", "a;b", "d", 1, "driver={SQL Server};server=s;uid=u;pwd={a;b};database=d"},
+    {"ODBC }", "s", "u", "x}y", "d", 1, "driver={SQL Server};server=s;uid=u;pwd={x}}y};database=d"},
+    {"ODBC {", "s", "{u", "p", "d", 1, "driver={SQL Server};server=s;uid={{u};pwd=p;database=d"},
+    {"ODBC quotes stay", "s", "u", "a\"b'c", "d", 1,
+     "driver={SQL Server};server=s;uid=u;pwd=a\"b'c;database=d"},
+    {"OLE DB, integrated security", "s", "", "p", "d", 2,
+     "Provider=sqloledb;Data Source=s;Integrated Security=SSPI;Persist Security Info=False;Initial Catalog=d"},
+    {"OLE DB, a user of one blank", "s", " ", "p", "d", 2,
+     "Provider=sqloledb;Data Source=s;User Id= ;Password=p;Initial Catalog=d"},
+    {"OLE DB ;", "s", "u;v", "a;b", "d", 2,
+     "Provider=sqloledb;Data Source=s;User Id=\"u;v\";Password=\"a;b\";Initial Catalog=d"},
+    {"OLE DB \" '", "s", "it's", "a\"b", "d", 2,
+     "Provider=sqloledb;Data Source=s;User Id=\"it's\";Password=\"a\"\"b\";Initial Catalog=d"},
+    {"OLE DB brace stays", "s", "u", "{x}", "d", 2,
+     "Provider=sqloledb;Data Source=s;User Id=u;Password={x};Initial Catalog=d"},
+    // A shop may pass a driver attribute with the server or the database on purpose.
+    {"ODBC, server and database as stored", "h;Port=1433", "u", "p;w", "d;TDS_Version=7.4", 1,
+     "driver={SQL Server};server=h;Port=1433;uid=u;pwd={p;w};database=d;TDS_Version=7.4"},
+    {"OLE DB, server and database as stored", "h;Port=1433", "u", "p", "d;TDS_Version=7.4", 2,
+     "Provider=sqloledb;Data Source=h;Port=1433;User Id=u;Password=p;Initial Catalog=d;TDS_Version=7.4"},
+    {"file", "data", "u", "p", "a.mdb", 3, "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=data/a.mdb"},
+    {"file, folder with separator", "data/", "", "", "a.mdb", 3,
+     "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=data/a.mdb"},
+    {"file, no folder", "", "", "", "a.mdb", 3, "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=a.mdb"},
+    {"no type", "s", "u", "p", "d", 0, ""},
+};
+
+// A value read back from a connection string.
+const struct Read
+{
+    const char *name, *text, *key, *value;
+} Reads[] = {
+    {"braced", "uid=u;pwd={a;b};database=d", "pwd", "a;b"},
+    {"doubled closing mark", "pwd={x}}y};database=d", "pwd", "x}y"},
+    {"braced at the very end", "uid=u;pwd={ab}", "pwd", "ab"},
+    {"doubled closing mark at the very end", "uid=u;pwd={x}}}", "pwd", "x}"},
+    {"unclosed brace", "uid=u;pwd={ab", "pwd", "ab"},
+    {"after the closing mark", "pwd={a}junk;database=d", "database", "d"},
+    {"ODBC keeps blanks", "uid= sa ;pwd=x", "uid", " sa "},
+    {"any letter case", "PWD=x", "pwd", "x"},
+    {"a part without =", "junk;pwd=x", "pwd", "x"},
+    {"empty at the end", "uid=u;pwd=", "pwd", ""},
+    {"missing", "uid=u", "pwd", ""},
+    {"OLE DB double quotes", "Provider=sqloledb;Password=\"a\"\"b;c\";User Id=u", "Password", "a\"b;c"},
+    {"OLE DB single quotes", "Provider=sqloledb;Password='it''s'", "Password", "it's"},
+    {"OLE DB blanks before the quote", "Provider=sqloledb;Password=  \"x;y\"", "Password", "x;y"},
+    {"OLE DB trims a bare value", "Provider=sqloledb;User Id= sa ;Password=p", "User Id", "sa"},
+    {"OLE DB blanks at the very end", "Provider=sqloledb;Password=  ", "Password", ""},
+    {"OLE DB braces are text", "Provider=sqloledb;Password={a};x=y", "Password", "{a}"},
+};
+
+// Passwords as printed.
+const struct Masked
+{
+    const char *name, *text, *masked;
+} Masks[] = {
+    {"ODBC", "server=s;pwd=secret;database=d", "server=s;pwd=****;database=d"},
+    {"ODBC braced, at the end", "server=s;uid=u;pwd={a;b}}c}", "server=s;uid=u;pwd=****"},
+    {"ODBC empty", "server=s;pwd=;database=d", "server=s;pwd=;database=d"},
+    {"OLE DB", "Provider=sqloledb;User Id=u;Password=\"x;y\";Initial Catalog=d",
+     "Provider=sqloledb;User Id=u;Password=****;Initial Catalog=d"},
+};
+
+// The type is stored as the list index of the connection dialog; a stored text that is not a
+// type leaves the type as it was (9 here).
+const struct StoredType
+{
+    const char *name, *stored;
+    int type;
+} StoredTypes[] = {
+    {"file", "2", 3},
+    {"none chosen", "-1", 0},
+    {"half rounds to even, up", "0.5", 2},
+    {"half rounds to even, down", "1.5", 2},
+    {"blanks around", " 1 ", 2},
+    {"not a number", "ODBC", 9},
+    {"largest", "32766", 32767},
+    {"beyond 16 bits", "32767", 9},
+    {"smallest", "-32769", -32768},
+    {"half below the smallest", "-32769.5", -32768},
+    {"below 16 bits", "-32770", 9},
+};
+
+QString text(const char *utf8)
+{
+    return QString::fromUtf8(utf8); // a null pointer gives the null text
+}
+
+} // namespace
+
+// Connection strings are built from what the user typed and read back by the connection, the
+// printed masks and the OLE DB conversion. The texts parsed here touch unreadable memory at both
+// ends, so that a read past an end fails the test.
 class ConnectionStringTest : public QObject
 {
     Q_OBJECT
 
 private Q_SLOTS:
-    void firstStartUsesTheDefaults()
-    {
-        MemorySettingsStore store;
-        ConnectionParams params;
-        GetRegConnParams(store, params);
-        QCOMPARE(params.server, QStringLiteral("server"));
-        QCOMPARE(params.user, QStringLiteral("sa"));
-        QCOMPARE(params.password, QString());
-        QCOMPARE(params.database, QStringLiteral("tarnik02"));
-        QCOMPARE(params.kind, ConnectionKind::Odbc);
-        QCOMPARE(BuildConnString(params),
-                 QStringLiteral("driver={SQL Server};server=server;uid=sa;pwd=;database=tarnik02"));
-    }
-
-    void storedValuesAreLoaded()
-    {
-        MemorySettingsStore store;
-        store.set(QStringLiteral("ConnServer"), QStringLiteral("SRV\\SQL2019"));
-        store.set(QStringLiteral("ConnUID"), QString());
-        store.set(QStringLiteral("ConnPWD"), QStringLiteral("secret"));
-        store.set(QStringLiteral("ConnDataBase"), QStringLiteral("company7"));
-        store.set(QStringLiteral("ConnType"), QStringLiteral("1"));
-        ConnectionParams params;
-        GetRegConnParams(store, params);
-        QCOMPARE(params.server, QStringLiteral("SRV\\SQL2019"));
-        QCOMPARE(params.user, QString());
-        QCOMPARE(params.password, QStringLiteral("secret"));
-        QCOMPARE(params.database, QStringLiteral("company7"));
-        QCOMPARE(params.kind, ConnectionKind::OleDb);
-    }
-
-    void storedTypeIsTheListIndexPlusOne_data()
-    {
-        QTest::addColumn<QString>("stored");
-        QTest::addColumn<int>("type"); // -1: the field keeps its value
-        QTest::newRow("ODBC") << "0" << 1;
-        QTest::newRow("OLE DB") << "1" << 2;
-        QTest::newRow("file") << "2" << 3;
-        QTest::newRow("none chosen") << "-1" << 0;
-        QTest::newRow("half rounds to even, up") << "0.5" << 2;
-        QTest::newRow("half rounds to even, down") << "1.5" << 2;
-        QTest::newRow("blanks around") << " 2 " << 3;
-        QTest::newRow("not a number") << "ODBC" << -1;
-        QTest::newRow("empty") << "" << -1;
-        QTest::newRow("beyond 16 bits") << "40000" << -1;
-    }
-    void storedTypeIsTheListIndexPlusOne()
-    {
-        QFETCH(QString, stored);
-        QFETCH(int, type);
-        MemorySettingsStore store;
-        store.set(QStringLiteral("ConnType"), stored);
-        ConnectionParams params;
-        params.kind = ConnectionKind::File;
-        GetRegConnParams(store, params);
-        QCOMPARE(int(params.kind), type < 0 ? 3 : type);
-    }
-
-    void buildsTheStringOfEachType_data()
-    {
-        const QString sep = pathSeparator();
-        QTest::addColumn<QString>("server");
-        QTest::addColumn<QString>("user");
-        QTest::addColumn<QString>("password");
-        QTest::addColumn<QString>("database");
-        QTest::addColumn<int>("type");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("ODBC") << "srv"
-                              << "sa"
-                              << "pw"
-                              << "db" << 1 << "driver={SQL Server};server=srv;uid=sa;pwd=pw;database=db";
-        QTest::newRow("ODBC, empty user")
-            << "srv"
-            << ""
-            << ""
-            << "db" << 1 << "driver={SQL Server};server=srv;uid=;pwd=;database=db";
-        QTest::newRow("ODBC, null password")
-            << "srv"
-            << "sa" << QString() << "db" << 1 << "driver={SQL Server};server=srv;uid=sa;pwd=;database=db";
-        QTest::newRow("OLE DB, integrated security")
-            << "srv"
-            << ""
-            << "ignored"
-            << "db" << 2
-            << "Provider=sqloledb;Data Source=srv;Integrated Security=SSPI;Persist Security Info=False;Initial Catalog=db";
-        QTest::newRow("OLE DB, a user of one blank")
-            << "srv"
-            << " "
-            << "pw"
-            << "db" << 2 << "Provider=sqloledb;Data Source=srv;User Id= ;Password=pw;Initial Catalog=db";
-        QTest::newRow("OLE DB, login")
-            << "srv"
-            << "sa"
-            << "pw"
-            << "db" << 2 << "Provider=sqloledb;Data Source=srv;User Id=sa;Password=pw;Initial Catalog=db";
-        QTest::newRow("file, folder without separator")
-            << "data"
-            << "sa"
-            << "pw"
-            << "company.mdb" << 3
-            << QStringLiteral("Provider=Microsoft.Jet.OLEDB.4.0;Data Source=data") + sep +
-                   QStringLiteral("company.mdb");
-        QTest::newRow("file, folder with separator")
-            << QStringLiteral("data") + sep << ""
-            << ""
-            << "company.mdb" << 3
-            << QStringLiteral("Provider=Microsoft.Jet.OLEDB.4.0;Data Source=data") + sep +
-                   QStringLiteral("company.mdb");
-        QTest::newRow("file, no folder")
-            << ""
-            << ""
-            << ""
-            << "company.mdb" << 3 << "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=company.mdb";
-        QTest::newRow("no type") << "srv"
-                                 << "sa"
-                                 << "pw"
-                                 << "db" << 0 << "";
-        QTest::newRow("type 4") << "srv"
-                                << "sa"
-                                << "pw"
-                                << "db" << 4 << "";
-        QTest::newRow("type -1") << "srv"
-                                 << "sa"
-                                 << "pw"
-                                 << "db" << -1 << "";
-    }
+    void buildsTheStringOfEachType_data() { addCaseRows(Builds); }
     void buildsTheStringOfEachType()
     {
-        QFETCH(QString, server);
-        QFETCH(QString, user);
-        QFETCH(QString, password);
-        QFETCH(QString, database);
-        QFETCH(int, type);
-        QFETCH(QString, expected);
-        QCOMPARE(BuildConnString(server, user, password, database, static_cast<ConnectionKind>(type)),
+        const Built &c = fetchCase(Builds);
+        QString server = text(c.server);
+        QString expected = text(c.expected);
+        if (c.type == 3) {
+            server.replace(u'/', pathSeparator());
+            expected.replace(u'/', pathSeparator());
+        }
+        QCOMPARE(BuildConnString(server, text(c.user), text(c.password), text(c.database),
+                                 static_cast<ConnectionKind>(c.type)),
                  expected);
     }
 
-    // A value that would split the string goes between braces (ODBC) or double quotes (OLE DB).
-    void quotesValuesThatWouldBreakTheString_data()
+    void readsAValue_data() { addCaseRows(Reads); }
+    void readsAValue()
     {
-        QTest::addColumn<QString>("password");
-        QTest::addColumn<int>("type");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("ODBC ;") << "a;b" << 1 << "driver={SQL Server};server=s;uid=u;pwd={a;b};database=d";
-        QTest::newRow("ODBC }") << "x}y" << 1 << "driver={SQL Server};server=s;uid=u;pwd={x}}y};database=d";
-        QTest::newRow("ODBC {") << "{abc" << 1 << "driver={SQL Server};server=s;uid=u;pwd={{abc};database=d";
-        QTest::newRow("ODBC quote stays")
-            << "a\"b'c" << 1 << "driver={SQL Server};server=s;uid=u;pwd=a\"b'c;database=d";
-        QTest::newRow("OLE DB ;")
-            << "a;b" << 2 << "Provider=sqloledb;Data Source=s;User Id=u;Password=\"a;b\";Initial Catalog=d";
-        QTest::newRow("OLE DB \"")
-            << "a\"b" << 2
-            << "Provider=sqloledb;Data Source=s;User Id=u;Password=\"a\"\"b\";Initial Catalog=d";
-        QTest::newRow("OLE DB '")
-            << "it's" << 2 << "Provider=sqloledb;Data Source=s;User Id=u;Password=\"it's\";Initial Catalog=d";
-        QTest::newRow("OLE DB brace stays")
-            << "{x}" << 2 << "Provider=sqloledb;Data Source=s;User Id=u;Password={x};Initial Catalog=d";
-    }
-    void quotesValuesThatWouldBreakTheString()
-    {
-        QFETCH(QString, password);
-        QFETCH(int, type);
-        QFETCH(QString, expected);
-        QCOMPARE(BuildConnString(QStringLiteral("s"), QStringLiteral("u"), password, QStringLiteral("d"),
-                                 static_cast<ConnectionKind>(type)),
-                 expected);
+        const Read &c = fetchCase(Reads);
+        for (const QString &guarded : atEdgesOfMemory(text(c.text)))
+            QCOMPARE(connStringValue(guarded, text(c.key)), text(c.value));
     }
 
-    // A user or password comes back out of the string as it went in, whatever it holds.
-    void loginSurvivesTheRoundTrip_data()
+    void masksThePasswordForPrinting_data() { addCaseRows(Masks); }
+    void masksThePasswordForPrinting()
     {
-        QTest::addColumn<QString>("value");
-        for (const char *value :
-             {"", "plain", "a;b", "}{", "x}}y", "{", "\"quoted\"", "it's", " spaced ", "a=b", "a;b}c{d\"e'f"})
-            QTest::newRow(value) << QString::fromUtf8(value);
-        QTest::newRow("Hebrew") << QStringLiteral("סיסמה;שלי");
-    }
-    void loginSurvivesTheRoundTrip()
-    {
-        QFETCH(QString, value);
-        const QString odbc =
-            BuildConnString(QStringLiteral("s"), value, value, QStringLiteral("d"), ConnectionKind::Odbc);
-        QCOMPARE(connStringValue(odbc, QStringLiteral("uid")), value);
-        QCOMPARE(connStringValue(odbc, QStringLiteral("pwd")), value);
-        QCOMPARE(splitConnString(odbc).size(), 5);
-        const QString oleDb = BuildConnString(QStringLiteral("s"), QStringLiteral("u"), value,
-                                              QStringLiteral("d"), ConnectionKind::OleDb);
-        const QString asParsed =
-            oleDbConnValue(value) == value ? value.trimmed() : value; // OLE DB trims a bare value
-        QCOMPARE(connStringValue(oleDb, QStringLiteral("Password")), asParsed);
-        QCOMPARE(splitConnString(oleDb).size(), 5);
-        // Type 2 reaches the server through the ODBC driver with the same values.
-        const QString converted = odbcConnStringForOleDb(oleDb);
-        QCOMPARE(connStringValue(converted, QStringLiteral("pwd")),
-                 connStringValue(oleDb, QStringLiteral("Password")));
-    }
-
-    // A shop may pass a driver attribute with the server or the database on purpose.
-    void serverAndDatabaseGoInAsStored_data()
-    {
-        QTest::addColumn<int>("type");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("ODBC") << int(ConnectionKind::Odbc)
-                              << QStringLiteral("driver={SQL Server};server=myhost;Port=1433;uid=u;pwd={p;w};"
-                                                "database=db;TDS_Version=7.4");
-        QTest::newRow("OLE DB") << int(ConnectionKind::OleDb)
-                                << QStringLiteral("Provider=sqloledb;Data Source=myhost;Port=1433;User Id=u;"
-                                                  "Password=\"p;w\";Initial Catalog=db;TDS_Version=7.4");
-    }
-    void serverAndDatabaseGoInAsStored()
-    {
-        QFETCH(int, type);
-        QFETCH(QString, expected);
-        QCOMPARE(BuildConnString(QStringLiteral("myhost;Port=1433"), QStringLiteral("u"),
-                                 QStringLiteral("p;w"), QStringLiteral("db;TDS_Version=7.4"),
-                                 static_cast<ConnectionKind>(type)),
-                 expected);
+        const Masked &c = fetchCase(Masks);
+        for (const QString &guarded : atEdgesOfMemory(text(c.text)))
+            QCOMPARE(maskConnStringPassword(guarded), text(c.masked));
     }
 
     void oleDbBecomesOdbc_data()
     {
-        QTest::addColumn<QString>("user");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("login") << "sa"
-                               << "driver={SQL Server};server=srv;uid=sa;pwd=p;database=db";
-        QTest::newRow("integrated security")
-            << ""
-            << "driver={SQL Server};server=srv;Trusted_Connection=yes;database=db";
+        QTest::addColumn<QString>("security");
+        QTest::addColumn<QString>("login");
+        for (const char *login : {"", "false"})
+            QTest::newRow(login) << text(login) << u"uid=sa;pwd=p"_s;
+        for (const char *integrated : {"SSPI", "True", "yes"})
+            QTest::newRow(integrated) << text(integrated) << u"Trusted_Connection=yes"_s;
     }
     void oleDbBecomesOdbc()
     {
-        QFETCH(QString, user);
-        QFETCH(QString, expected);
-        const QString oleDb = BuildConnString(QStringLiteral("srv"), user, QStringLiteral("p"),
-                                              QStringLiteral("db"), ConnectionKind::OleDb);
-        QCOMPARE(odbcConnStringForOleDb(oleDb), expected);
+        QFETCH(QString, security);
+        QFETCH(QString, login);
+        const QString oleDb =
+            u"Provider=sqloledb;Data Source=srv;Integrated Security=%1;User Id=sa;Password=p;"
+            "Initial Catalog=db"_s.arg(security);
+        QCOMPARE(odbcConnStringForOleDb(oleDb),
+                 u"driver={SQL Server};server=srv;%1;database=db"_s.arg(login));
     }
 
-    void masksThePasswordForPrinting_data()
+    void loadsTheStoredType_data() { addCaseRows(StoredTypes); }
+    void loadsTheStoredType()
     {
-        QTest::addColumn<QString>("text");
-        QTest::addColumn<QString>("masked");
-        QTest::newRow("ODBC") << "driver={SQL Server};server=s;uid=u;pwd=secret;database=d"
-                              << "driver={SQL Server};server=s;uid=u;pwd=****;database=d";
-        QTest::newRow("ODBC braced") << "driver={SQL Server};server=s;uid=u;pwd={a;b}}c};database=d"
-                                     << "driver={SQL Server};server=s;uid=u;pwd=****;database=d";
-        QTest::newRow("ODBC empty") << "driver={SQL Server};server=s;uid=u;pwd=;database=d"
-                                    << "driver={SQL Server};server=s;uid=u;pwd=;database=d";
-        QTest::newRow("OLE DB")
-            << "Provider=sqloledb;Data Source=s;User Id=u;Password=\"x;y\";Initial Catalog=d"
-            << "Provider=sqloledb;Data Source=s;User Id=u;Password=****;Initial Catalog=d";
-        QTest::newRow("file") << "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=/data/a.mdb"
-                              << "Provider=Microsoft.Jet.OLEDB.4.0;Data Source=/data/a.mdb";
-    }
-    void masksThePasswordForPrinting()
-    {
-        QFETCH(QString, text);
-        QFETCH(QString, masked);
-        QCOMPARE(maskConnStringPassword(text), masked);
+        const StoredType &c = fetchCase(StoredTypes);
+        MemorySettingsStore store;
+        store.set(ConnTypeKey, text(c.stored));
+        ConnectionParams params;
+        params.kind = static_cast<ConnectionKind>(9);
+        GetRegConnParams(store, params);
+        QCOMPARE(int(params.kind), c.type);
     }
 };
 

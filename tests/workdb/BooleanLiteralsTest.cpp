@@ -1,11 +1,15 @@
 #include "workdb/BooleanLiterals.h"
 
+#include "testutil/EdgeOfMemory.h"
 #include "testutil/TestMain.h"
 
 #include <QTest>
 
 using namespace zorbin;
+using namespace zorbin::test;
 
+// True and False in the statements on the working database become -1 and 0. Each statement
+// ends at unreadable memory, so that a read past its end fails the test.
 class BooleanLiteralsTest : public QObject
 {
     Q_OBJECT
@@ -15,38 +19,38 @@ private Q_SLOTS:
     {
         QTest::addColumn<QString>("sql");
         QTest::addColumn<QString>("expected");
-        QTest::newRow("catalog query")
-            << QStringLiteral(
-                   "SELECT tItems.ItemKey FROM tItems WHERE tItems.Include = True ORDER BY tItems.ItemKey ASC")
-            << QStringLiteral(
-                   "SELECT tItems.ItemKey FROM tItems WHERE tItems.Include = -1 ORDER BY tItems.ItemKey ASC");
-        QTest::newRow("selection list")
-            << QStringLiteral(
-                   "SELECT ItemKey, ItemName, Include FROM tItems WHERE (1 > 0) And Include = True ORDER BY tItems.Include, tItems.Itemkey")
-            << QStringLiteral(
-                   "SELECT ItemKey, ItemName, Include FROM tItems WHERE (1 > 0) And Include = -1 ORDER BY tItems.Include, tItems.Itemkey");
-        QTest::newRow("false and letter case")
-            << QStringLiteral("UPDATE tItems SET Include = FALSE WHERE Include=true")
-            << QStringLiteral("UPDATE tItems SET Include = 0 WHERE Include=-1");
-        QTest::newRow("inside quotes")
-            << QStringLiteral("SELECT 'True', \"False\", [True] FROM t WHERE a = 'it''s True'")
-            << QStringLiteral("SELECT 'True', \"False\", [True] FROM t WHERE a = 'it''s True'");
-        QTest::newRow("part of a word")
-            << QStringLiteral("SELECT TrueName, IsFalse, True_1, tItems.True FROM t")
-            << QStringLiteral("SELECT TrueName, IsFalse, True_1, tItems.True FROM t");
-        QTest::newRow("comments") << QStringLiteral("SELECT 1 -- True\n, /* False */ True")
-                                  << QStringLiteral("SELECT 1 -- True\n, /* False */ -1");
-        QTest::newRow("after a minus") << QStringLiteral("SELECT -True") << QStringLiteral("SELECT - -1");
-        QTest::newRow("Hebrew text untouched") << QStringLiteral("SELECT 'כן True' WHERE x = True")
-                                               << QStringLiteral("SELECT 'כן True' WHERE x = -1");
-        QTest::newRow("unclosed quote") << QStringLiteral("SELECT 'True") << QStringLiteral("SELECT 'True");
-        QTest::newRow("nothing to do") << QString() << QString();
+        const char *cases[][3] = {
+            {"false and letter case", "UPDATE tItems SET Include = FALSE WHERE Include=true",
+             "UPDATE tItems SET Include = 0 WHERE Include=-1"},
+            {"a literal at the end", "SELECT 1 FROM tItems WHERE tItems.Include = True",
+             "SELECT 1 FROM tItems WHERE tItems.Include = -1"},
+            {"a literal alone", "false", "0"},
+            {"inside quotes", "SELECT 'True', \"False\", `True`, [True] FROM t WHERE a = 'it''s True'",
+             "SELECT 'True', \"False\", `True`, [True] FROM t WHERE a = 'it''s True'"},
+            {"a doubled quote mark at the end", "SELECT 'it''", "SELECT 'it''"},
+            {"a quote at the end", "SELECT True, 'x'", "SELECT -1, 'x'"},
+            {"a bracketed name ends at the first ]", "SELECT [a]]True", "SELECT [a]]-1"},
+            {"part of a word", "SELECT TrueName, IsFalse, True_1, $True, tItems.True FROM t",
+             "SELECT TrueName, IsFalse, True_1, $True, tItems.True FROM t"},
+            {"comments", "SELECT 1 -- True\n, /* False */ True", "SELECT 1 -- True\n, /* False */ -1"},
+            {"a comment at the end", "SELECT True -- False", "SELECT -1 -- False"},
+            {"an unclosed comment", "SELECT True /* False", "SELECT -1 /* False"},
+            {"a minus at the end", "SELECT True -", "SELECT -1 -"},
+            {"a slash at the end", "SELECT True /", "SELECT -1 /"},
+            {"after a minus", "SELECT -True", "SELECT - -1"},
+            {"Hebrew text untouched", "SELECT 'כן True' WHERE x = True", "SELECT 'כן True' WHERE x = -1"},
+            {"unclosed quote", "SELECT 'True", "SELECT 'True"},
+            {"nothing to do", "", ""},
+        };
+        for (const auto &c : cases)
+            QTest::newRow(c[0]) << QString::fromUtf8(c[1]) << QString::fromUtf8(c[2]);
     }
     void translatesOnlyTheLiterals()
     {
         QFETCH(QString, sql);
         QFETCH(QString, expected);
-        QCOMPARE(translateBooleanLiterals(sql), expected);
+        for (const QString &guarded : atEdgesOfMemory(sql))
+            QCOMPARE(translateBooleanLiterals(guarded), expected);
     }
 };
 

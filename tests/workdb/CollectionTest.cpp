@@ -1,18 +1,20 @@
 #include "model/CatalogSettings.h"
-#include "model/ConnectionParams.h"
 #include "model/RunContext.h"
 #include "model/RunState.h"
-#include "platform/FileSystem.h"
 #include "source/ConnectionString.h"
 #include "source/SourceConnection.h"
 #include "testutil/AccountingFixture.h"
+#include "testutil/CaseTable.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
 #include "testutil/SqliteOdbcDriver.h"
+#include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
 #include "workdb/CollectionLock.h"
 #include "workdb/CollectionRun.h"
+#include "workdb/SourceReadAhead.h"
+#include "workdb/SourceRowCount.h"
 #include "workdb/WorkDatabasePath.h"
 
 #include <QTemporaryDir>
@@ -20,81 +22,69 @@
 
 using namespace zorbin;
 using namespace zorbin::test;
+using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
-// A small accounting database with a case for every rule of the collection, in the order the
-// source returns the rows.
-const QStringList SmallSource = {
-    QStringLiteral("INSERT INTO Items VALUES "
-                   "('A100','כיסא אלון','Oak chair',1,'AX00000001','יח''',10.5,'ש\"ח','/pics/a100.png'),"
-                   "('a200',NULL,'Lamp',NULL,NULL,NULL,NULL,NULL,NULL),"
-                   "('ab','first ab',NULL,2,'BX','סט',3,'$','/pics/ab.png'),"
-                   "('AB','second AB',NULL,3,'CX','סט',4,'$','/pics/AB2.png'),"
-                   "('#','general',NULL,1,NULL,NULL,0,NULL,NULL),"
-                   "('*','internal',NULL,1,NULL,NULL,0,NULL,NULL),"
-                   "(NULL,'no key',NULL,1,NULL,NULL,0,NULL,NULL),"
-                   "('','empty key',NULL,1,NULL,NULL,0,NULL,NULL),"
-                   "('B300','first B300',NULL,4,NULL,'זוג',5,'ש\"ח',''),"
-                   "('B300','second B300',NULL,5,NULL,'זוג',6,'ש\"ח',NULL),"
-                   "('C400','מנורה',NULL,6,NULL,'סט',7,'ש\"ח',NULL),"
-                   "('D500','ספה',NULL,7,NULL,'סט',8,'ש\"ח',NULL),"
-                   "('E600','שטיח',NULL,8,NULL,'סט',9,'ש\"ח',NULL),"
-                   "('ך1','final',NULL,9,NULL,'סט',1,'ש\"ח',NULL),"
-                   "('כ1','normal',NULL,9,NULL,'סט',2,'ש\"ח',NULL)"),
-    QStringLiteral("INSERT INTO PriceListsLastDateWithSub VALUES "
-                   "('A100',1,9.5,NULL,''),('a200',1,NULL,'$',''),('A100',1,8,'$',''),('#',1,1,'$',''),"
-                   "('ab',2,7,'$',''),('AB',2,70,'$','')"),
-    QStringLiteral("INSERT INTO ExtraNotes VALUES "
-                   "(1,'A100',1,'אדום'),(1,'A100',1,'שני'),(1,'a200',1,NULL),(0,'A100',2,'not an item note'),"
-                   "(1,'ab',2,'/pics/note-ab.png'),(1,'C400',2,'/pics/note-c.png'),(1,'*',2,'star')"),
-    QStringLiteral("INSERT INTO ItemSortNames VALUES "
-                   "(1,'סלון'),(2,NULL),(3,''),(1,'כפול'),(NULL,'ללא קוד'),(40,'מחוץ לטווח')"),
-};
-
-// The small source's items in tItems (columns in the table's order), ordered by key (Hebrew first, Latin
-// without letter case).
-const QStringList SmallItems = {
-    QStringLiteral("ך1|final|9|<null>|סט|1|ש\"ח|?|-1"),
-    QStringLiteral("כ1|normal|9|<null>|סט|2|ש\"ח|?|-1"),
-    QStringLiteral("A100|כיסא אלון|1|AX00000001|יח'|10.5|ש\"ח|/pics/a100.png|-1"),
-    QStringLiteral("a200|?|<null>|<null>|?|<null>|?|?|-1"),
-    QStringLiteral("ab|first ab|2|BX|סט|3|$|/pics/ab.png|-1"),
-    QStringLiteral("B300|first B300|4|<null>|זוג|5|ש\"ח||-1"),
-    QStringLiteral("C400|מנורה|6|<null>|סט|7|ש\"ח|?|-1"),
-    QStringLiteral("D500|ספה|7|<null>|סט|8|ש\"ח|?|-1"),
-    QStringLiteral("E600|שטיח|8|<null>|סט|9|ש\"ח|?|-1"),
-};
-
-QString cell(const QVariant &value)
+// The small accounting database of small-source.sql and the working tables a collection makes
+// of it, small-collected.txt.
+QString testData(const char *name)
 {
-    return value.isNull() ? QStringLiteral("<null>") : value.toString();
+    return QString::fromUtf8(
+        readFile(QStringLiteral(ZORBIN_SOURCE_DIR "/tests/workdb/data/") + QLatin1String(name)));
 }
 
+// Sources whose item step fails ("; " between statements, %1 a text of 100 Hebrew letters; no
+// source: a database that cannot be reached), and the keys written before the failure. Reading
+// fails after some rows: the SQLite ODBC driver reads them all ahead, and fails when the statement
+// runs. A text too long: characters, not bytes, count (Hebrew letters take two bytes each).
+const struct FailedItemStep
+{
+    const char *name, *source, *failure, *written;
+    int fillWidth;
+} FailedItemSteps[] = {
+    {"a text too long",
+     "INSERT INTO Items (ItemKey, ItemName) VALUES ('K1','a'),('K2','b'),('K3','c'),('K4','d'),('K5','%1'),"
+     "('K6','%1x'),('K7','g')",
+     "פריט K6: הטקסט ארוך מדי לשדה ItemName, שמקבל עד 100 תווים.", "K1 K2 K3 K4 K5", 714},
+    {"reading fails after some rows",
+     "ALTER TABLE Items RENAME TO ItemRows; INSERT INTO ItemRows (ItemKey, SortGroup) VALUES ('K1',1),('K2',2),"
+     "('K3',3),('K4',4),('K5',5),('K6',6),('K7',7); CREATE VIEW Items AS SELECT ItemKey, ItemName, ForignName, "
+     "Filter, SalesUnit, Price, Currency, ExFile, abs(CASE WHEN SortGroup = 6 THEN -9223372036854775807 - 1 ELSE "
+     "SortGroup END) AS SortGroup FROM ItemRows",
+     "integer overflow", "K1 K2 K3 K4 K5", 714},
+    {"a sort bound that is not a number", "", "מקוד מיון", "", 0},
+    {"pictures from a note not chosen", "", "נתון נוסף", "", 0},
+    {"an unreachable source", nullptr, "", "", 0},
+};
+
+// Copies the first column's text.
+const SourceReadAhead::Shaper KeyOnly = [](std::span<const QVariant> read, std::span<WorkValue> row) {
+    row[0] = WorkValue::from(read[0]);
+};
+
+// Selects the entry of `itemData` in a list of the sales price and two others.
 void choose(ChoiceList &list, int itemData)
 {
     list.clear();
-    list.addEntry(QStringLiteral("מחיר מכירה"), 0);
-    list.addEntry(QStringLiteral("ראשון"), 1);
-    list.addEntry(QStringLiteral("שני"), 2);
-    for (int i = 0; i < list.count(); ++i) {
-        if (list.entry(i).itemData == itemData)
-            list.setCurrentIndex(i);
-    }
+    for (const int number : {0, 1, 2})
+        list.addEntry(QString::number(number), number);
+    list.setCurrentIndex(itemData);
 }
 
 } // namespace
 
 // The collection run against SQLite accounting databases, opened as a database file and
-// through the real ODBC driver manager with the SQLite3 ODBC driver.
+// through the real ODBC driver manager with the SQLite3 ODBC driver; and the reading of the
+// source on a thread of its own, many batches ahead of the step that writes the rows.
 class CollectionTest : public QObject
 {
     Q_OBJECT
 
 private:
     QTemporaryDir m_temp;
-    QByteArray m_oldTemp;
     QString m_smallSource;
+    QString m_manyRows; // 10,000 items, K00001 to K10000, each its number as sort group
     bool m_odbc = false;
     std::unique_ptr<CatalogSettings> m_settings;
     ConnectionParams m_connection;
@@ -115,6 +105,11 @@ private:
             qWarning("%s", qPrintable(made.description()));
         return path;
     }
+    void collectPrice(int digit, int list)
+    {
+        (digit == 1 ? m_settings->collectPrice1 : m_settings->collectPrice2) = true;
+        choose(digit == 1 ? m_settings->priceList1 : m_settings->priceList2, list);
+    }
     Result<CollectionReport> collect() { return BuildAndCollectData(*m_context); }
     // A collection that starts and runs every step.
     void collectAll()
@@ -128,26 +123,28 @@ private:
     {
         const Result<CollectionReport> report = collect();
         if (!report)
-            return Status::fault(QStringLiteral("escaped: ") + report.status().description());
+            return Status::fault(u"escaped: "_s + report.status().description());
         return report->stepFailure;
     }
+    // The rows of a working table, "|" between values, a Null as "<null>".
     QStringList rows(const QString &table) const
     {
         QStringList described;
         for (const QVariantList &row : readWorkTable(m_state.WorkDBFile, table)) {
             QStringList cells;
             for (const QVariant &value : row)
-                cells << cell(value);
+                cells << (value.isNull() ? u"<null>"_s : value.toString());
             described << cells.join(QLatin1Char('|'));
         }
         return described;
     }
-    QStringList keys(const QString &table) const
+    // One column of a working table (the key by default), its values separated by blanks.
+    QString keys(const QString &table, int column = 0) const
     {
         QStringList found;
-        for (const QVariantList &row : readWorkTable(m_state.WorkDBFile, table))
-            found << row.first().toString();
-        return found;
+        for (const QString &row : rows(table))
+            found << row.section(QLatin1Char('|'), column, column);
+        return found.join(QLatin1Char(' '));
     }
 
 private Q_SLOTS:
@@ -162,13 +159,13 @@ private Q_SLOTS:
         QVERIFY(m_temp.isValid());
         const Status registered = registerSqliteOdbcAsSqlServer();
         QVERIFY2(registered, qPrintable(registered.description()));
-        m_oldTemp = qgetenv("TMPDIR");
-        qputenv("TMPDIR", QFile::encodeName(m_temp.path()));
-        m_smallSource = m_temp.filePath(QStringLiteral("small.db"));
-        const Status made = makeAccountingFile(m_smallSource, SmallSource);
-        QVERIFY2(made, qPrintable(made.description()));
+        qputenv("TMPDIR", QFile::encodeName(m_temp.path())); // the working database's folder
+        m_smallSource = makeSource(u"small.db"_s, testData("small-source.sql").split(u";\n"_s));
+        m_manyRows = makeSource(u"many.db"_s,
+                                {u"INSERT INTO Items (ItemKey, SortGroup) WITH RECURSIVE n(i) AS (SELECT "
+                                 "1 UNION ALL SELECT i + 1 FROM n WHERE i < 10000) SELECT "
+                                 "printf('K%05d', i), i FROM n"_s});
     }
-    void cleanupTestCase() { qputenv("TMPDIR", m_oldTemp); }
     void init()
     {
         QFETCH_GLOBAL(bool, odbc);
@@ -179,289 +176,228 @@ private Q_SLOTS:
         m_connection = connectionTo(m_smallSource);
         m_state = RunState();
         m_user = RecordingUserPort();
-        m_files.failingPaths.clear();
         m_context =
             std::make_unique<RunContext>(RunContext{*m_settings, m_connection, m_state, m_user, m_files});
     }
 
-    void theSourceIsReachedThroughTheDriverItsTextNames()
-    {
-        const QString text = BuildConnString(m_connection);
-        Result<std::unique_ptr<SourceConnection>> source = SourceConnection::open(text);
-        QVERIFY2(source, qPrintable(source.status().description()));
-        if (m_odbc) {
-            QCOMPARE(text,
-                     QStringLiteral("driver={SQL Server};server=localhost;uid=catalog;pwd=secret;database=") +
-                         m_smallSource);
-            QCOMPARE(source.value()->database().driverName(), QStringLiteral("QODBC"));
-        } else {
-            QCOMPARE(source.value()->database().driverName(), QStringLiteral("QSQLITE"));
-        }
-    }
-
     void copiesItemsSortGroupsPricesAndNotes()
     {
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
-        m_settings->collectPrice2 = true;
-        choose(m_settings->priceList2, 2);
-        m_settings->collectNote1 = true;
+        collectPrice(1, 1);
+        collectPrice(2, 2);
+        m_settings->collectNote1 = m_settings->collectNote2 = true;
         choose(m_settings->extraNote1, 1);
-        m_settings->collectNote2 = true;
         choose(m_settings->extraNote2, 2);
-
         collectAll();
         QCOMPARE(m_state.WorkDBFile, workDatabasePath());
-        QCOMPARE(
-            m_user.statuses,
-            QStringList({QStringLiteral("מאתחל בסיס נתונים זמני"), QStringLiteral("סורק את רשימת הפריטים"),
-                         QStringLiteral("סורק קודי מיון"), QStringLiteral("סורק מחירון ראשי"),
-                         QStringLiteral("סורק מחירון משני"), QStringLiteral("סורק נתון נוסף 1"),
-                         QStringLiteral("סורק נתון נוסף 2"), QStringLiteral("סריקת הנתונים הסתיימה")}));
-        // Nulls become "?" in name, unit, currency and picture and stay Null in sort group,
-        // filter and price; "#", "*", the Null key and the empty key never arrive; of "ab" and
-        // "AB", and of the two "B300", the first stays.
-        QCOMPARE(rows(QStringLiteral("tItems")), SmallItems);
-        // Sort groups ignore the item range: every code, the first of a code held twice, Null
-        // for a Null or empty name.
-        QCOMPARE(rows(QStringLiteral("tItemSort")),
-                 QStringList({QStringLiteral("1|סלון"), QStringLiteral("2|<null>"),
-                              QStringLiteral("3|<null>"), QStringLiteral("40|מחוץ לטווח")}));
-        // A Null currency is the shekel, a Null price stays Null, the first price of an item stays.
-        QCOMPARE(rows(QStringLiteral("tItemPrice1")),
-                 QStringList({QStringLiteral("A100|ש\"ח|9.5"), QStringLiteral("a200|$|<null>")}));
-        QCOMPARE(rows(QStringLiteral("tItemPrice2")), QStringList{QStringLiteral("ab|$|7")});
-        QCOMPARE(rows(QStringLiteral("tExtraNote1")),
-                 QStringList({QStringLiteral("A100|אדום"), QStringLiteral("a200|?")}));
-        QCOMPARE(rows(QStringLiteral("tExtraNote2")), QStringList({QStringLiteral("ab|/pics/note-ab.png"),
-                                                                   QStringLiteral("C400|/pics/note-c.png")}));
-    }
-
-    void progressCountsEverySelectedRow()
-    {
-        // Twelve rows selected (the empty key and both duplicates count): points at 5 and 10.
-        QVERIFY(collect());
-        QCOMPARE(m_user.widths, QList<int>({0, 417, 833, 0}));
+        QCOMPARE(m_user.statuses,
+                 QStringList({u"מאתחל בסיס נתונים זמני"_s, u"סורק את רשימת הפריטים"_s, u"סורק קודי מיון"_s,
+                              u"סורק מחירון ראשי"_s, u"סורק מחירון משני"_s, u"סורק נתון נוסף 1"_s,
+                              u"סורק נתון נוסף 2"_s, u"סריקת הנתונים הסתיימה"_s}));
+        QStringList tables;
+        for (const char *table :
+             {"tItems", "tItemPrice1", "tItemPrice2", "tExtraNote1", "tExtraNote2", "tItemSort"})
+            tables << QLatin1String(table) << rows(QLatin1String(table));
+        QStringList expected = testData("small-collected.txt").split(u'\n', Qt::SkipEmptyParts);
+        expected.removeIf([](const QString &line) { return line.startsWith(u'#'); });
+        QCOMPARE(tables, expected);
+        QVERIFY(m_user.messages.isEmpty());
+        // Twelve items selected (the empty key and both duplicates count): points at 5 and 10; the
+        // bar empty at the start and the end of each step that has rows and polls.
+        QCOMPARE(m_user.widths, QList<int>({0, 417, 833, 0, 0, 0, 0, 0, 0, 0, 0, 0}));
         QCOMPARE(m_user.yields, 2);
     }
 
+    // Stop pressed while row 7 is copied: the loop sees it at row 10. The request stays: the
+    // sort groups are copied whole (no stop test), a price list stops at its first point.
     void stopEndsTheStepAtTheNextProgressPoint()
     {
-        // Stop pressed while row 7 is copied: the loop sees it at row 10.
         m_user.onYield = [this] {
             if (m_user.yields == 2)
                 m_state.StopRequested = true;
         };
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
-        collectAll();
-        QCOMPARE(keys(QStringLiteral("tItems")),
-                 QStringList({QStringLiteral("A100"), QStringLiteral("a200"), QStringLiteral("ab"),
-                              QStringLiteral("B300"), QStringLiteral("C400"), QStringLiteral("D500"),
-                              QStringLiteral("E600")}));
+        collectPrice(1, 1);
+        const Result<CollectionReport> report = collect();
+        QVERIFY(report && report->stepFailure && report->stopped);
+        QCOMPARE(keys(u"tItems"_s), u"A100 a200 ab B300 C400 D500 E600"_s);
         QCOMPARE(m_user.widths.mid(0, 4), QList<int>({0, 417, 833, 0}));
-        // The request stays: the sort groups are copied whole (no stop test), the price list
-        // stops at its first point, which it does not reach with two rows.
-        QCOMPARE(keys(QStringLiteral("tItemSort")).size(), 4);
-        QCOMPARE(keys(QStringLiteral("tItemPrice1")).size(), 2);
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("סריקת הנתונים הסתיימה"));
+        QCOMPARE(rows(u"tItemSort"_s).size(), 4);
+        QCOMPARE(keys(u"tItemPrice1"_s), u"A100 a200"_s);
+        QCOMPARE(m_user.statuses.last(), u"סריקת הנתונים הסתיימה"_s);
     }
 
-    void aStopStaysSetForTheNextSteps()
-    {
-        // Set before the run: every polling step ends at its first progress point.
-        m_state.StopRequested = true;
-        QVERIFY(collect());
-        QCOMPARE(keys(QStringLiteral("tItems")),
-                 QStringList({QStringLiteral("A100"), QStringLiteral("a200"), QStringLiteral("ab")}));
-        QCOMPARE(m_user.widths, QList<int>({0, 417, 0}));
-    }
-
-    void pictureReferencesByKey_data()
+    // The folder, a separator unless it ends in one, the key and the extension.
+    void picturesNamedByKey_data()
     {
         QTest::addColumn<QString>("folder");
-        QTest::addColumn<QString>("expected");
-        QTest::newRow("folder") << QStringLiteral("/photos") << QStringLiteral("/photos/A100.JPG");
-        QTest::newRow("folder with separator")
-            << QStringLiteral("/photos/") << QStringLiteral("/photos/A100.JPG");
-        QTest::newRow("no folder") << QString() << QStringLiteral("/A100.JPG");
+        for (const char *folder : {"/photos", "/photos/", ""})
+            QTest::newRow(folder) << QString::fromUtf8(folder);
     }
-    void pictureReferencesByKey()
+    void picturesNamedByKey()
     {
         QFETCH(QString, folder);
-        QFETCH(QString, expected);
         m_settings->pictureSource = PictureSource::ItemKey;
         m_settings->pictureFolder = folder;
-        m_settings->pictureExtension = QStringLiteral(".JPG");
-        QVERIFY(collect());
-        QCOMPARE(readWorkTable(m_state.WorkDBFile, QStringLiteral("tItems")).at(2).at(7).toString(),
-                 expected);
+        m_settings->pictureExtension = u".JPG"_s;
+        collectAll();
+        QCOMPARE(keys(u"tItems"_s, 7).section(u' ', 2, 2),
+                 folder.isEmpty() ? u"/A100.JPG"_s : u"/photos/A100.JPG"_s);
     }
 
-    void picturesFromAnExtraNoteLeaveOutItemsWithoutOne()
+    // Pictures from an extra note leave out the items without one; foreign names.
+    void picturesFromAnExtraNoteAndForeignNames()
     {
         m_settings->pictureSource = PictureSource::ExtraNote;
         choose(m_settings->pictureNote, 2);
         m_settings->itemName = ItemNameSource::Foreign;
-        QVERIFY(collect());
-        QCOMPARE(rows(QStringLiteral("tItems")),
-                 QStringList({QStringLiteral("ab|?|2|BX|סט|3|$|/pics/note-ab.png|-1"),
-                              QStringLiteral("C400|?|6|<null>|סט|7|ש\"ח|/pics/note-c.png|-1")}));
+        collectAll();
+        QCOMPARE(rows(u"tItems"_s), QStringList({u"ab|?|2|BX|סט|3|$|/pics/note-ab.png|-1"_s,
+                                                 u"C400|?|6|<null>|סט|7|ש\"ח|/pics/note-c.png|-1"_s}));
+        m_settings->pictureSource = PictureSource::FileField;
+        collectAll();
+        QCOMPARE(keys(u"tItems"_s, 1), u"? ? Oak chair Lamp ? ? ? ? ?"_s);
     }
 
-    void foreignNames()
+    // A failure of the item step ends the run there; what was written before it stays, and the
+    // bar keeps its last width.
+    void aFailedItemStepEndsTheRun_data() { addCaseRows(FailedItemSteps); }
+    void aFailedItemStepEndsTheRun()
     {
-        m_settings->itemName = ItemNameSource::Foreign;
-        QVERIFY(collect());
-        const QList<QVariantList> items = readWorkTable(m_state.WorkDBFile, QStringLiteral("tItems"));
-        QCOMPARE(items.at(2).at(1).toString(), QStringLiteral("Oak chair"));
-        QCOMPARE(items.at(3).at(1).toString(), QStringLiteral("Lamp"));
-        QCOMPARE(items.at(4).at(1).toString(), QStringLiteral("?"));
+        const FailedItemStep &c = fetchCase(FailedItemSteps);
+        const QByteArray name = c.name;
+        const QString source = QString::fromUtf8(c.source).replace(u"%1"_s, QString(100, QChar(0x05E9)));
+        m_connection = connectionTo(c.source ? makeSource(u"failing.db"_s, source.split(u"; "_s))
+                                             : m_temp.filePath(u"missing/nothing.db"_s));
+        m_settings->sortCodeRange = name.contains("sort bound");
+        m_settings->sortCodeFrom = u"x"_s;
+        if (name.contains("note"))
+            m_settings->pictureSource = PictureSource::ExtraNote;
+        collectPrice(1, 1);
+        const Status failure = failedStep();
+        QVERIFY2(!failure && failure.description().contains(QString::fromUtf8(c.failure)),
+                 qPrintable(failure.description()));
+        QCOMPARE(m_user.statuses.last(), u"סורק את רשימת הפריטים"_s);
+        const bool readAhead = m_odbc && name.startsWith("reading");
+        QCOMPARE(keys(u"tItems"_s), readAhead ? QString() : QString::fromUtf8(c.written));
+        QCOMPARE(m_user.fillWidth, readAhead ? 0 : c.fillWidth);
+        QCOMPARE(keys(u"tItemSort"_s), QString());
     }
 
-    void aTextTooLongFailsTheItemStepAndStopsTheRun()
-    {
-        const QString longName(101, QChar(0x05E9));
-        m_connection = connectionTo(makeSource(
-            QStringLiteral("long.db"),
-            {QStringLiteral(
-                 "INSERT INTO Items (ItemKey, ItemName) VALUES ('K1','a'),('K2','b'),('K3','c'),('K4','d'),"
-                 "('K5','e'),('K6','%1'),('K7','g')")
-                 .arg(longName)}));
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
-        QCOMPARE(failedStep().description(),
-                 QStringLiteral("פריט K6: הטקסט ארוך מדי לשדה ItemName, שמקבל עד 100 תווים."));
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
-        // What was written before the failure stays; the bar keeps its last width.
-        QCOMPARE(keys(QStringLiteral("tItems")).size(), 5);
-        QCOMPARE(m_user.fillWidth, 714);
-        QCOMPARE(keys(QStringLiteral("tItemSort")).size(), 0);
-    }
-
-    void keysDifferingInCaseAreOneKey()
-    {
-        QVERIFY(collect());
-        QVERIFY(keys(QStringLiteral("tItems")).contains(QStringLiteral("ab")));
-        QVERIFY(!keys(QStringLiteral("tItems")).contains(QStringLiteral("AB")));
-        QVERIFY(m_user.messages.isEmpty());
-    }
-
+    // A list to collect without an entry chosen ends the run before its step.
     void aChosenListWithoutSelectionEndsTheRun()
     {
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
+        collectPrice(1, 1);
         m_settings->collectNote1 = true;
-        m_settings->extraNote1.clear();
         const Result<CollectionReport> collected = collect();
-        QVERIFY(!collected);
-        QVERIFY(collected.status().description().contains(QStringLiteral("נתון נוסף 1")));
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק נתון נוסף 1"));
-        QCOMPARE(keys(QStringLiteral("tItems")).size(), SmallItems.size());
-        QCOMPARE(keys(QStringLiteral("tItemPrice1")).size(), 2);
+        QVERIFY(!collected && collected.status().description().contains(u"נתון נוסף 1"_s));
+        QCOMPARE(m_user.statuses.last(), u"סורק נתון נוסף 1"_s);
+        QCOMPARE(rows(u"tItems"_s).size(), 9);
+        QCOMPARE(keys(u"tItemPrice1"_s), u"A100 a200"_s);
     }
 
-    void onlyPriceListTwoFillsOnlyItsTable()
-    {
-        m_settings->collectPrice2 = true;
-        choose(m_settings->priceList2, 2);
-        choose(m_settings->priceList1, 1);
-        QVERIFY(collect());
-        QVERIFY(!m_user.statuses.contains(QStringLiteral("סורק מחירון ראשי")));
-        QCOMPARE(keys(QStringLiteral("tItemPrice1")), QStringList());
-        QCOMPARE(keys(QStringLiteral("tItemPrice2")), QStringList{QStringLiteral("ab")});
-        QCOMPARE(keys(QStringLiteral("tExtraNote1")), QStringList());
-    }
-
+    // Only the ticked lists are collected; a second run leaves nothing of the first (not even a
+    // journal, which would be played back), and its item range holds for the prices too.
     void aSecondRunLeavesNothingOfTheFirst()
     {
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
-        QVERIFY(collect());
-        QCOMPARE(keys(QStringLiteral("tItemPrice1")).size(), 2);
+        collectPrice(1, 1);
+        choose(m_settings->priceList2, 2);
+        collectAll();
+        QVERIFY(!m_user.statuses.contains(u"סורק מחירון משני"_s));
+        QCOMPARE(keys(u"tItemPrice1"_s), u"A100 a200"_s);
+        QCOMPARE(keys(u"tItemPrice2"_s), QString());
 
+        writeFile(workDatabasePath() + u"-journal"_s, QByteArray(512, 'j'));
+        m_user.statuses.clear();
         m_settings->collectPrice1 = false;
+        collectPrice(2, 2);
         m_settings->itemKeyRange = true;
-        m_settings->itemKeyFrom = QStringLiteral("C");
-        m_settings->itemKeyTo = QStringLiteral("E");
-        QVERIFY(collect());
-        QCOMPARE(keys(QStringLiteral("tItems")),
-                 QStringList({QStringLiteral("C400"), QStringLiteral("D500")}));
-        QCOMPARE(keys(QStringLiteral("tItemPrice1")), QStringList());
-        QCOMPARE(keys(QStringLiteral("tItemSort")).size(), 4);
+        m_settings->itemKeyFrom = u"B"_s;
+        m_settings->itemKeyTo = u"E"_s;
+        collectAll();
+        QVERIFY(!m_user.statuses.contains(u"סורק מחירון ראשי"_s));
+        QCOMPARE(keys(u"tItems"_s), u"B300 C400 D500"_s);
+        QCOMPARE(keys(u"tItemPrice1"_s), QString());
+        QCOMPARE(keys(u"tItemPrice2"_s), u"D500"_s);
+        QCOMPARE(rows(u"tItemSort"_s).size(), 4);
+        QVERIFY(!QFile::exists(workDatabasePath() + u"-journal"_s));
     }
 
     void anEmptySelectionWritesNothingAndLeavesTheBar()
     {
         m_settings->itemKeyRange = true;
-        m_settings->itemKeyFrom = QStringLiteral("תת");
+        m_settings->itemKeyFrom = u"תת"_s;
         m_user.fillWidth = 300;
         collectAll();
-        QCOMPARE(keys(QStringLiteral("tItems")), QStringList());
+        QCOMPARE(keys(u"tItems"_s), QString());
         QVERIFY(m_user.widths.isEmpty());
         QCOMPARE(m_user.fillWidth, 300);
     }
 
-    void anUnreachableSourceIsShownOnceAndStopsTheRun()
-    {
-        m_connection = connectionTo(m_temp.filePath(QStringLiteral("missing/nothing.db")));
-        QVERIFY(!failedStep());
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("סורק את רשימת הפריטים"));
-    }
-
+    // The last collection's file cannot be deleted (another program holds it open).
     void aWorkingDatabaseThatCannotBeMadeEndsTheCollection()
     {
         collectAll();
-        m_files.failingPaths.insert(workDatabasePath());
-        QVERIFY(!collect());
+        m_files.failingPaths = {workDatabasePath()};
+        const Result<CollectionReport> collected = collect();
+        m_files.failingPaths.clear();
+        QVERIFY(!collected && collected.status().description().contains(workDatabasePath()));
         QCOMPARE(m_state.WorkDBFile, QString());
-        QCOMPARE(m_user.statuses.last(), QStringLiteral("מאתחל בסיס נתונים זמני"));
-    }
-
-    void aRefusedCriterionFailsTheItemStep()
-    {
-        m_settings->sortCodeRange = true;
-        m_settings->sortCodeFrom = QStringLiteral("x");
-        QVERIFY(failedStep().description().contains(QStringLiteral("מקוד מיון")));
+        QCOMPARE(m_user.statuses.last(), u"מאתחל בסיס נתונים זמני"_s);
     }
 
     void aSecondCollectionIsRefusedWhileOneRuns()
     {
         Result<std::unique_ptr<CollectionLock>> held = CollectionLock::acquire(workDatabasePath());
         QVERIFY(held);
-        m_state.WorkDBFile = QStringLiteral("earlier");
+        m_state.WorkDBFile = u"earlier"_s;
         const Result<CollectionReport> refused = collect();
-        QVERIFY(!refused);
-        QVERIFY(refused.status().description().contains(QStringLiteral("איסוף נתונים אחר כבר פועל")));
-        QCOMPARE(m_state.WorkDBFile, QStringLiteral("earlier"));
+        QVERIFY(!refused && refused.status().description().contains(u"איסוף נתונים אחר כבר פועל"_s));
+        QCOMPARE(m_state.WorkDBFile, u"earlier"_s);
         QVERIFY(m_user.statuses.isEmpty());
         held.value().reset();
-        QVERIFY(collect());
+        collectAll();
         QCOMPARE(m_state.WorkDBFile, workDatabasePath());
     }
 
-    void theDemoDatabase()
+    void readsEveryRowInOrderAndCountsThem()
     {
-        m_connection = connectionTo(demoDatabasePath());
-        m_settings->collectPrice1 = true;
-        choose(m_settings->priceList1, 1);
-        m_settings->collectNote2 = true;
-        choose(m_settings->extraNote2, 2);
-        collectAll();
-        const QStringList items = keys(QStringLiteral("tItems"));
-        QVERIFY(items.size() > 250);
-        QVERIFY(!items.contains(QStringLiteral("#")));
-        QVERIFY(!items.contains(QStringLiteral("*")));
-        QCOMPARE(items.count(QStringLiteral("A0008")), 1);
-        for (const QVariantList &item : readWorkTable(m_state.WorkDBFile, QStringLiteral("tItems"))) {
-            if (item.first() == QStringLiteral("A0008"))
-                QVERIFY(!item.at(1).toString().contains(QStringLiteral("כפולה")));
+        SourceReadAhead source(BuildConnString(connectionTo(m_manyRows)),
+                               u"SELECT ItemKey FROM Items WHERE SortGroup > 100"_s, {u"itemkey"_s}, true, 1,
+                               KeyOnly);
+        QVERIFY(source.waitUntilRunning());
+        QCOMPARE(source.total(), 9900);
+        int rows = 0;
+        while (source.next()) {
+            ++rows;
+            QCOMPARE(source.row()[0].toText(), u"K%1"_s.arg(100 + rows, 5, 10, QLatin1Char('0')));
         }
-        const QList<QVariantList> notes = readWorkTable(m_state.WorkDBFile, QStringLiteral("tExtraNote2"));
-        QVERIFY(std::any_of(notes.begin(), notes.end(), [](const QVariantList &note) {
-            return note.at(0) == QStringLiteral("B0009") && note.at(1) == QStringLiteral("?");
-        }));
-        QVERIFY(!keys(QStringLiteral("tItemPrice1")).isEmpty());
+        QCOMPARE(rows, 9900);
+        QVERIFY(source.readFailure());
+    }
+
+    // Far more rows than are held ahead: the reader waits for room until it is stopped.
+    void stoppingEarlyReleasesTheReader()
+    {
+        SourceReadAhead source(BuildConnString(connectionTo(m_manyRows)), u"SELECT ItemKey FROM Items"_s,
+                               {u"ItemKey"_s}, false, 1, KeyOnly);
+        QVERIFY(source.waitUntilRunning());
+        QCOMPARE(source.total(), 0);
+        for (int i = 0; i < 7; ++i)
+            QVERIFY(source.next());
+        QCOMPARE(source.row()[0].toText(), u"K00007"_s);
+    }
+
+    // A trailing comment would swallow the closing parenthesis of the count: the rows are counted
+    // instead.
+    void countsAStatementTheDatabaseCannotNest()
+    {
+        Result<std::unique_ptr<SourceConnection>> source =
+            SourceConnection::open(BuildConnString(connectionTo(m_manyRows)));
+        QVERIFY(source);
+        for (const QString &comment : {QString(), u" -- the first"_s})
+            QCOMPARE(countSourceRows(*source.value(),
+                                     u"SELECT ItemKey FROM Items WHERE SortGroup <= 42"_s + comment),
+                     42);
+        QCOMPARE(countSourceRows(*source.value(), u"SELECT Nothing FROM Nowhere"_s), 0);
     }
 };
 

@@ -4,16 +4,10 @@
 
 ZORBIN_DECLARE_TEST(BooleanLiteralsTest)
 ZORBIN_DECLARE_TEST(WorkDatabaseTest)
-ZORBIN_DECLARE_TEST(CreateWorkDBTest)
-ZORBIN_DECLARE_TEST(SourceStatementsTest)
-ZORBIN_DECLARE_TEST(SourceReadAheadTest)
 ZORBIN_DECLARE_TEST(CollectionTest)
 
 ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
 ZORBIN_TEST_ADD(BooleanLiteralsTest)
 ZORBIN_TEST_ADD(WorkDatabaseTest)
-ZORBIN_TEST_ADD(CreateWorkDBTest)
-ZORBIN_TEST_ADD(SourceStatementsTest)
-ZORBIN_TEST_ADD(SourceReadAheadTest)
 ZORBIN_TEST_ADD(CollectionTest)
 ZORBIN_TEST_MAIN_END
