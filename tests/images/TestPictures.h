@@ -1,17 +1,25 @@
 #pragma once
 
+#include "testutil/TestFiles.h"
+
 #include <QByteArray>
 #include <QString>
 
 namespace zorbin::test {
 
-// The folder of the pictures that ImageMagick made for these tests at build time.
-QString testPicture(const QString &name);
-// The bytes of a test picture; fails the test when it cannot be read.
-QByteArray testPictureBytes(const QString &name);
+// A picture that ImageMagick made for these tests at build time.
+inline QString testPicture(const QString &name)
+{
+    return QStringLiteral(ZORBIN_TEST_PICTURES "/") + name;
+}
 
-// A top-down copy of a bottom-up 24-bit BMP: the rows in the opposite order and the height
-// stored negative, as top-down pictures are written.
-QByteArray topDownBitmap(const QByteArray &bottomUp);
+// Its bytes; ends the tests when it is missing.
+inline QByteArray testPictureBytes(const QString &name)
+{
+    const QByteArray bytes = readFile(testPicture(name));
+    if (bytes.isEmpty())
+        qFatal("The test picture %s is missing: build the target image-test-pictures.", qPrintable(name));
+    return bytes;
+}
 
 } // namespace zorbin::test
