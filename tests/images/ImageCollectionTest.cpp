@@ -108,12 +108,14 @@ private Q_SLOTS:
     {
         Catalog catalog;
         const QStringList p = catalog.pictures(4);
+        const QByteArray large = QByteArray(100 * 1024, 'p') + "end"; // more than one block of the copy
+        writeFile(p[3], large);
         writeFile(catalog.picture(u"?"_qs)); // a file named as the no-picture mark
         writeFile(catalog.picture(u"logo.png"_qs), "logo");
         catalog.output.settings.logo = catalog.picture(u"logo.png"_qs);
         catalog.makeItems({p[3], p[0], p[2], p[0], catalog.picture(u"missing.jpg"_qs), u"?"_qs, QString(),
                            u""_qs, catalog.picture(u"p?1.jpg"_qs), catalog.picture(u"*.jpg"_qs),
-                           catalog.root.path(), p[1]},
+                           catalog.root.path(), catalog.picture(u"P02.JPG"_qs)},
                           {2});
         catalog.output.settings.sortDirection = SortDirection::Descending;
         const QString previous = QDir::currentPath();
@@ -121,10 +123,12 @@ private Q_SLOTS:
         const Status status = catalog.collect();
         QDir::setCurrent(previous);
         QVERIFY2(status.isOk(), qPrintable(status.description()));
-        const QStringList copied{u"logo.png"_qs, u"p02.jpg"_qs, u"p01.jpg"_qs, u"p04.jpg"_qs};
+        // "P02.JPG" is found as "p02.jpg" and copied under the name the pages give it.
+        const QStringList copied{u"logo.png"_qs, u"P02.JPG"_qs, u"p01.jpg"_qs, u"p04.jpg"_qs};
         QCOMPARE(catalog.files.copies, copied);
         QCOMPARE(catalog.recorded(), copied);
-        QCOMPARE(readFile(catalog.images() + u"/p04.jpg"_qs), QByteArray("p04.jpg"));
+        QCOMPARE(readFile(catalog.images() + u"/p04.jpg"_qs), large);
+        QCOMPARE(readFile(catalog.images() + u"/P02.JPG"_qs), QByteArray("p02.jpg"));
         // 11 items: after items 5 and 10, 5/11 and 10/11 of the frame of 1000, then back to 0.
         QCOMPARE(catalog.output.user.widths, (QList<int>{0, 455, 909, 0}));
         QCOMPARE(catalog.output.user.yields, 2);

@@ -142,11 +142,20 @@ private Q_SLOTS:
             << QByteArray::fromHex("424D 00000000 00000000 36000000 28000000 01000000 00000080") << none;
         QTest::newRow("PNG wider than 2^31-1")
             << QByteArray::fromHex("89504E470D0A1A0A 0000000D49484452 80000000 00000001 0802000000") << none;
-        // Cut just before the last header byte the reader needs.
-        QTest::newRow("PNG cut short") << png.left(25) << none;
-        QTest::newRow("GIF cut short") << testPictureBytes(u"picture.gif"_qs).left(9) << none;
-        QTest::newRow("BMP cut short") << bmp.left(25) << none;
-        QTest::newRow("JPEG cut short") << exif.left(exif.indexOf("\xFF\xC0") + 8) << none;
+        QTest::newRow("PNG 2^31-1 wide")
+            << QByteArray::fromHex("89504E470D0A1A0A 0000000D49484452 7FFFFFFF 00000001 0802000000")
+            << ImageInfo{ImageInfo::PNG, 2147483647, 1};
+        // Each kind cut just before the last header byte the reader needs, and just after it.
+        const std::tuple<const char *, QByteArray, qsizetype, ImageInfo> ends[] = {
+            {"PNG", testPictureBytes(u"png-type2.png"_qs), 26, {ImageInfo::PNG, 240, 90}},
+            {"GIF", testPictureBytes(u"picture.gif"_qs), 10, {ImageInfo::GIF, 16, 17}},
+            {"BMP", bmp, 26, {ImageInfo::BMP, 800, 600}},
+            {"JPEG", exif, exif.indexOf("\xFF\xC0") + 9, {ImageInfo::JPEG, 640, 480}},
+        };
+        for (const auto &[kind, bytes, end, info] : ends) {
+            QTest::addRow("%s cut short", kind) << bytes.left(end - 1) << none;
+            QTest::addRow("%s ending with its header", kind) << bytes.left(end) << info;
+        }
     }
     void readsData()
     {

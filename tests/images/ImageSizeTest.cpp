@@ -41,7 +41,7 @@ private Q_SLOTS:
         QTest::newRow("no width") << ImageInfo{ImageInfo::GIF, 0, 10} << box << QSize();
         QTest::newRow("no height") << ImageInfo{ImageInfo::JPEG, 10, 0} << box << QSize();
         QTest::newRow("box without width") << png(10, 10) << QSize(0, 90) << QSize();
-        QTest::newRow("box without height") << png(10, 10) << QSize(120, -1) << QSize();
+        QTest::newRow("box without height") << png(10, 10) << QSize(120, 0) << QSize();
     }
     void fitsIntoTheBox()
     {

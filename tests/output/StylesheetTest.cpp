@@ -27,7 +27,7 @@ private Q_SLOTS:
         test::OutputContext output;
         CellLine &line = output.settings.lines[8];
         line.field = 1;
-        line.format = {7, 255, 9, 2, 3, 5};
+        line.format = {3, 255, 3, 2, 3, 3}; // font, size, weight, underline, italic, align
         QVERIFY(CreateCSS(output.context, m_dir.path(), true).isOk());
         QVERIFY(test::readFile(path()).contains(
             ".L8 {font-family:Arial (Hebrew); font-weight:Normal; font-size:255pt; text-align:Right; "

@@ -77,6 +77,7 @@ private Q_SLOTS:
         QCOMPARE(formatOneDecimal(100.0 / 16), u"06.3"_qs); // a half away from zero
         QCOMPARE(formatOneDecimal(100.0 / 1.5), u"66.7"_qs);
         QCOMPARE(formatOneDecimal(100.0 / 999), u"00.1"_qs);
+        QCOMPARE(formatOneDecimal(0.0), u"00.0"_qs);
     }
 };
 
