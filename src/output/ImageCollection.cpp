@@ -11,6 +11,7 @@
 #include "workdb/WorkDatabase.h"
 
 #include <QHash>
+#include <QSqlError>
 #include <QSqlRecord>
 #include <QStringList>
 
@@ -37,6 +38,9 @@ Result<QStringList> pictureReferences(const CatalogSettings &settings, const QSt
             const QVariant value = query->value(column);
             references << (value.isNull() ? QString() : value.toString());
         }
+        // A read that fails ends the rows as their end does.
+        if (const QSqlError error = query->lastError(); error.isValid())
+            return Status::fault(error.text());
     }
     return references;
 }

@@ -1,17 +1,18 @@
 #pragma once
 
-#include <QByteArray>
-#include <QString>
+#include "testutil/TestFiles.h"
 
 namespace zorbin::test {
 
-// The folder of the pictures that ImageMagick made for these tests at build time.
-QString testPicture(const QString &name);
-// The bytes of a test picture; fails the test when it cannot be read.
-QByteArray testPictureBytes(const QString &name);
+// A picture that ImageMagick made for these tests at build time (the target image-test-pictures).
+inline QString testPicture(const QString &name)
+{
+    return QStringLiteral(ZORBIN_TEST_PICTURES "/") + name;
+}
 
-// A top-down copy of a bottom-up 24-bit BMP: the rows in the opposite order and the height
-// stored negative, as top-down pictures are written.
-QByteArray topDownBitmap(const QByteArray &bottomUp);
+inline QByteArray testPictureBytes(const QString &name)
+{
+    return readFile(testPicture(name));
+}
 
 } // namespace zorbin::test

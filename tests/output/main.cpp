@@ -2,16 +2,12 @@
 
 #include <QCoreApplication>
 
-ZORBIN_DECLARE_TEST(CatalogQueryTest)
-ZORBIN_DECLARE_TEST(EncodingTest)
 ZORBIN_DECLARE_TEST(FileNamingTest)
 ZORBIN_DECLARE_TEST(GoldenCatalogTest)
 ZORBIN_DECLARE_TEST(PagesRunTest)
 ZORBIN_DECLARE_TEST(StylesheetTest)
 
 ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
-ZORBIN_TEST_ADD(CatalogQueryTest)
-ZORBIN_TEST_ADD(EncodingTest)
 ZORBIN_TEST_ADD(FileNamingTest)
 ZORBIN_TEST_ADD(GoldenCatalogTest)
 ZORBIN_TEST_ADD(PagesRunTest)

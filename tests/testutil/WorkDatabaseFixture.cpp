@@ -41,6 +41,9 @@ Status makeWorkDatabase(const QString &path, const WorkRows &rows)
     Result<std::unique_ptr<WorkDatabase>> work = WorkDatabase::open(path);
     if (!work)
         return work.status();
+    // One transaction: a row at a time, tens of thousands of items would take minutes.
+    if (Status begun = work.value()->begin(); !begun)
+        return begun;
     QList<QVariantList> items;
     for (const WorkItem &item : rows.items)
         items << item.values();
@@ -50,7 +53,7 @@ Status makeWorkDatabase(const QString &path, const WorkRows &rows)
         if (Status written = writeRows(*work.value(), it.key(), it.value()); !written)
             return written;
     }
-    return Status::ok();
+    return work.value()->commit();
 }
 
 QList<QVariantList> readWorkTable(const QString &path, const QString &table)
