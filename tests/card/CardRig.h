@@ -134,18 +134,4 @@ struct CardRig
     std::unique_ptr<MainCard> card;
 };
 
-// Lists as a reachable accounting database fills them: three price lists, two note kinds.
-inline void fillDemoLists(CatalogSettings &settings)
-{
-    for (ChoiceList *notes : {&settings.extraNote1, &settings.extraNote2, &settings.pictureNote}) {
-        notes->addEntry(QStringLiteral("צבע"), 1);
-        notes->addEntry(QStringLiteral("תמונה"), 2);
-    }
-    for (ChoiceList *prices : {&settings.priceList1, &settings.priceList2}) {
-        prices->addEntry(QStringLiteral("מחיר הפריט"), 0);
-        prices->addEntry(QStringLiteral("סיטונאי"), 3);
-        prices->addEntry(QStringLiteral("קמעונאי"), 4);
-    }
-}
-
 } // namespace zorbin::test
