@@ -1,12 +1,14 @@
+// zorbin-cli as a user runs it: each command on the demo database, and what it wrote or printed.
+#include "testutil/DemoScratch.h"
 #include "testutil/TestFiles.h"
-#include "testutil/TestMain.h"
 
 #include <QDir>
 #include <QFileInfo>
 #include <QProcess>
 #include <QRegularExpression>
-#include <QTemporaryDir>
 #include <QTest>
+
+using namespace zorbin::test;
 
 namespace {
 
@@ -17,19 +19,30 @@ struct Run
     QString err;
 };
 
-Run runCli(const QStringList &arguments, const QString &folder = {})
+// Runs zorbin-cli with the words of `commandLine` (the demo's settings file in place of
+// "SETTINGS") in the demo's scratch folder, where its working database goes too.
+Run runCli(const QString &commandLine, const DemoScratch &demo)
 {
+    QStringList arguments = commandLine.split(QLatin1Char(' '), Qt::SkipEmptyParts);
+    arguments.replaceInStrings(QStringLiteral("SETTINGS"), demo.settingsFile);
     QProcess process;
-    process.setProgram(QStringLiteral(ZORBIN_CLI));
-    process.setArguments(arguments);
-    if (!folder.isEmpty())
-        process.setWorkingDirectory(folder);
-    process.start();
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert(QStringLiteral("TMPDIR"), demo.folder.path());
+    process.setProcessEnvironment(environment);
+    process.setWorkingDirectory(demo.folder.path());
+    process.start(QStringLiteral(ZORBIN_CLI), arguments);
     process.closeWriteChannel(); // it must never wait for input
     if (!process.waitForFinished(120000))
         return {};
     return {process.exitCode(), QString::fromUtf8(process.readAllStandardOutput()),
             QString::fromUtf8(process.readAllStandardError())};
+}
+
+void setStored(DemoScratch &demo, const char *key, const char *value)
+{
+    demo.store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QLatin1String(key),
+                      QLatin1String(value));
+    demo.store->flush();
 }
 
 } // namespace
@@ -39,73 +52,89 @@ class CommandLineTest : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void everyCommandHasHelp_data()
+    void commandLines_data()
     {
-        QTest::addColumn<QString>("command");
-        QTest::addColumn<QString>("mentions");
-        QTest::newRow("catalog") << QStringLiteral("catalog") << QStringLiteral("--use-marked");
-        QTest::newRow("list") << QStringLiteral("list") << QStringLiteral("--only-with-picture");
-        QTest::newRow("demo") << QStringLiteral("demo") << QStringLiteral("--out");
-        QTest::newRow("sql") << QStringLiteral("sql") << QStringLiteral("--settings");
+        QTest::addColumn<QString>("commandLine");
+        QTest::addColumn<int>("exitCode");
+        for (const auto &[line, exitCode] :
+             std::initializer_list<std::pair<const char *, int>>{{"--help", 0},
+                                                                 {"catalog --help", 0},
+                                                                 {"", 2},
+                                                                 {"print", 2},
+                                                                 {"catalog --colour", 2},
+                                                                 {"list now", 2},
+                                                                 {"catalog --settings /no/such.ini", 2},
+                                                                 {"sql --settings /no/such.ini", 2}})
+            QTest::newRow(*line ? line : "nothing") << QString::fromLatin1(line) << exitCode;
     }
-    void everyCommandHasHelp()
+    void commandLines()
     {
-        QFETCH(QString, command);
-        QFETCH(QString, mentions);
-        const Run run = runCli({command, QStringLiteral("--help")});
-        QCOMPARE(run.exitCode, 0);
-        QVERIFY2(run.out.contains(mentions), qPrintable(run.out));
+        QFETCH(QString, commandLine);
+        QFETCH(int, exitCode);
+        QCOMPARE(runCli(commandLine, DemoScratch()).exitCode, exitCode);
     }
 
-    void wrongCommandLinesAreUsageErrors_data()
+    // Each run prints the path of what it wrote; the test reads the files themselves.
+    void wholeRunsOnTheDemo_data()
     {
-        QTest::addColumn<QStringList>("arguments");
-        QTest::newRow("nothing") << QStringList{};
-        QTest::newRow("unknown command") << QStringList{QStringLiteral("print")};
-        QTest::newRow("unknown option") << QStringList{QStringLiteral("catalog"), QStringLiteral("--colour")};
-        QTest::newRow("stray argument") << QStringList{QStringLiteral("list"), QStringLiteral("now")};
-        QTest::newRow("missing settings file") << QStringList{
-            QStringLiteral("catalog"), QStringLiteral("--settings"), QStringLiteral("/no/such.ini")};
+        QTest::addColumn<QString>("commandLine");
+        QTest::addColumn<QString>("printed"); // relative to the scratch folder
+        QTest::addColumn<bool>("catalog");
+        QTest::newRow("catalog") << QStringLiteral("catalog --settings SETTINGS")
+                                 << QStringLiteral("catalog/zoindex.htm") << true;
+        QTest::newRow("list") << QStringLiteral("list --settings SETTINGS")
+                              << QStringLiteral("catalog/zorbin3.htm") << false;
+        QTest::newRow("demo") << QStringLiteral("demo --out shop") << QStringLiteral("shop/zoindex.htm")
+                              << true;
     }
-    void wrongCommandLinesAreUsageErrors()
+    void wholeRunsOnTheDemo()
     {
-        QFETCH(QStringList, arguments);
-        QCOMPARE(runCli(arguments).exitCode, 2);
+        QFETCH(QString, commandLine);
+        QFETCH(QString, printed);
+        QFETCH(bool, catalog);
+        DemoScratch demo;
+        const Run run = runCli(commandLine, demo);
+        QCOMPARE(run.exitCode, 0);
+        const QString first = demo.folder.filePath(printed);
+        QCOMPARE(run.out, first + QLatin1Char('\n'));
+        // 301 items, nine to a page: the first page, 33 more, the stylesheet; or the list alone.
+        const QDir folder = QFileInfo(first).dir();
+        const QStringList written = folder.entryList({QStringLiteral("*.htm"), QStringLiteral("*.css")});
+        QCOMPARE(written.size(), catalog ? 35 : 1);
+        QVERIFY(written.contains(QStringLiteral("zo000034.htm")) == catalog);
+        QVERIFY(folder.exists(QStringLiteral("images/item-11.jpg")) == catalog);
+        if (catalog)
+            QCOMPARE(firstItemKey(first), QStringLiteral("00010"));
+        else
+            QCOMPARE(listRows(first), 301);
+    }
+
+    // --use-marked makes the catalog of the working database that the last collection left,
+    // marks and all; with none there, the run says what to do and fails.
+    void catalogOfTheMarkedItems()
+    {
+        DemoScratch demo;
+        const QString marked = QStringLiteral("catalog --use-marked --settings SETTINGS");
+        const Run none = runCli(marked, demo);
+        QCOMPARE(none.exitCode, 1);
+        QVERIFY2(none.err.contains(QStringLiteral("בחירת פריטים")), qPrintable(none.err));
+        QCOMPARE(runCli(QStringLiteral("list --settings SETTINGS"), demo).exitCode, 0);
+        const Run run = runCli(marked, demo);
+        QCOMPARE(run.exitCode, 0);
+        QCOMPARE(firstItemKey(demo.out(QStringLiteral("zoindex.htm"))), QStringLiteral("00010"));
+        QVERIFY2(!run.err.contains(QStringLiteral("סורק")), qPrintable(run.err)); // nothing collected
     }
 
     // A run that cannot reach the accounting database says why on standard error and fails.
     void unreachableDatabaseFails()
     {
-        QTemporaryDir folder;
-        QVERIFY(folder.isValid());
-        const QString settings = folder.filePath(QStringLiteral("settings.ini"));
-        QFile file(settings);
-        QVERIFY(file.open(QIODevice::WriteOnly));
-        file.write(QStringLiteral(
-                       "[Params]\nConnType=2\nConnServer=%1\nConnDataBase=missing.db\nPagingPath=%1/out\n")
-                       .arg(folder.path())
-                       .toUtf8());
-        file.close();
-        const Run run =
-            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        DemoScratch demo;
+        setStored(demo, "ConnDataBase", "missing.db");
+        const Run run = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
         QCOMPARE(run.exitCode, 1);
         QVERIFY2(run.err.contains(QStringLiteral("missing.db")), qPrintable(run.err));
         QVERIFY2(run.err.contains(QStringLiteral("תקלה")), qPrintable(run.err));
-    }
-
-    void demoWritesTheCatalog()
-    {
-        QTemporaryDir folder;
-        QVERIFY(folder.isValid());
-        const Run run =
-            runCli({QStringLiteral("demo"), QStringLiteral("--out"), QStringLiteral("shop")}, folder.path());
-        QCOMPARE(run.exitCode, 0);
-        const QString first = folder.filePath(QStringLiteral("shop/zoindex.htm"));
-        QCOMPARE(run.out.trimmed(), first);
-        QVERIFY(QFileInfo::exists(first));
-        QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/zo000002.htm"))));
-        QVERIFY(QFileInfo::exists(folder.filePath(QStringLiteral("shop/tarnik.css"))));
-        QVERIFY(!QDir(folder.filePath(QStringLiteral("shop/images"))).isEmpty());
+        QVERIFY(!QFileInfo::exists(demo.out(QStringLiteral("zoindex.htm"))));
     }
 
     // Stored numbers are read as the pages have always read them: a band that is no number is left
@@ -113,59 +142,62 @@ private Q_SLOTS:
     // grid that cannot be made is refused, with the field's name.
     void catalogReadsStoredNumbersAsThePagesDo()
     {
-        QTemporaryDir folder;
-        QVERIFY(folder.isValid());
-        const QString settings = folder.filePath(QStringLiteral("settings.ini"));
-        QByteArray demo = zorbin::test::readFile(
-            QDir(zorbin::test::demoFolder()).filePath(QStringLiteral("demo-settings.ini")));
-        const QByteArray output = "\nPagingPath=" + folder.filePath(QStringLiteral("out")).toUtf8() + "\n";
-        zorbin::test::writeFile(settings, demo + "\nTopPercent=abc\nBottomPercent=100\nImageW=0" + output);
-        const Run run =
-            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        DemoScratch demo;
+        setStored(demo, "TopPercent", "abc");
+        setStored(demo, "BottomPercent", "100");
+        setStored(demo, "ImageW", "0");
+        const Run run = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
         QCOMPARE(run.exitCode, 0);
-        const QString first = folder.filePath(QStringLiteral("out/zoindex.htm"));
-        QCOMPARE(run.out.trimmed(), first);
-        const QString page = QString::fromLatin1(zorbin::test::readFile(first));
+        const QString page = QString::fromLatin1(readFile(run.out.trimmed()));
         QVERIFY(!page.contains(QStringLiteral("class=Top1")));
         QVERIFY(page.contains(QRegularExpression(QStringLiteral("<td colspan=\\d+ height='100%'>"))));
         QVERIFY(page.contains(QStringLiteral("<img src=")));
         QVERIFY(!page.contains(QRegularExpression(QStringLiteral("<img [^>]* height=\\d"))));
 
-        zorbin::test::writeFile(settings, demo + "\nRows=abc" + output);
-        const Run refused =
-            runCli({QStringLiteral("catalog"), QStringLiteral("--settings"), settings}, folder.path());
+        setStored(demo, "Rows", "abc");
+        const Run refused = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
         QCOMPARE(refused.exitCode, 1);
         QVERIFY2(refused.err.contains(QStringLiteral("\"שורות\"")), qPrintable(refused.err));
     }
 
-    // Each enabled step prints its statement once, in the order of a run; the password never shows.
+    // Each enabled step prints its statement once, in the order of a run; the password never
+    // shows; a step enabled without its list's choice is a fault.
     void sqlListsTheStatementsOfARun()
     {
-        QTemporaryDir folder;
-        QVERIFY(folder.isValid());
-        const QString settings = folder.filePath(QStringLiteral("settings.ini"));
-        const QByteArray common = "[Params]\nConnType=0\nConnServer=db1\nConnUID=shop\nConnPWD=s3cret\n"
-                                  "ConnDataBase=stock\nUseCatCode=1\nFromSort=10\nLineTag0=0\nLineTag1=8\n";
-        zorbin::test::writeFile(settings, common + "UseExtraNote2=1\n");
-        const Run run = runCli({QStringLiteral("sql"), QStringLiteral("--settings"), settings});
-        QCOMPARE(run.exitCode, 1); // the note kinds could not be read, so no note is chosen
-        QVERIFY2(run.err.contains(QStringLiteral("נתון נוסף 2")), qPrintable(run.err));
-
-        zorbin::test::writeFile(settings, common);
-        const Run listed = runCli({QStringLiteral("sql"), QStringLiteral("--settings"), settings});
-        QCOMPARE(listed.exitCode, 0);
+        DemoScratch demo;
+        const QString sql = QStringLiteral("sql --settings SETTINGS");
+        const Run run = runCli(sql, demo);
+        QCOMPARE(run.exitCode, 0);
         QStringList labels;
-        for (const QString &line : listed.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts))
+        for (const QString &line : run.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts))
             labels << line.section(QLatin1Char(':'), 0, 0);
         QCOMPARE(labels, (QStringList{QStringLiteral("connection"), QStringLiteral("items"),
-                                      QStringLiteral("sort-groups"), QStringLiteral("catalog")}));
-        QVERIFY(
-            listed.out.contains(QStringLiteral("connection: driver={SQL Server};server=db1;uid=shop;pwd=")));
-        QVERIFY(!listed.out.contains(QStringLiteral("s3cret")));
+                                      QStringLiteral("sort-groups"), QStringLiteral("price1"),
+                                      QStringLiteral("catalog")}));
+        QVERIFY(run.out.contains(QStringLiteral("PriceListNumber = 1 ")));
+
+        // A server that cannot be reached: no list is filled.
+        for (const auto &[key, value] :
+             std::initializer_list<std::pair<const char *, const char *>>{{"ConnType", "0"},
+                                                                          {"ConnUID", "shop"},
+                                                                          {"ConnPWD", "s3cret"},
+                                                                          {"UsePriceField", "0"},
+                                                                          {"UseCatCode", "1"},
+                                                                          {"FromSort", "10"},
+                                                                          {"UseExtraNote2", "1"}})
+            setStored(demo, key, value);
+        const Run noNote = runCli(sql, demo);
+        QCOMPARE(noNote.exitCode, 1);
+        QVERIFY2(noNote.err.contains(QStringLiteral("נתון נוסף 2")), qPrintable(noNote.err));
+        setStored(demo, "UseExtraNote2", "0");
+        const Run listed = runCli(sql, demo);
+        QCOMPARE(listed.exitCode, 0);
+        QVERIFY(listed.out.startsWith(QStringLiteral("connection: driver={SQL Server};")));
+        QVERIFY(listed.out.contains(QStringLiteral(";uid=shop;pwd=")) &&
+                !listed.out.contains(QLatin1String("s3cret")));
         QVERIFY(listed.out.contains(QStringLiteral(" And Items.SortGroup >= 10")));
-        QVERIFY(listed.out.contains(QStringLiteral("(Select ExtraNote From tExtraNote2")));
     }
 };
 
-ZORBIN_TEST_CLASS(CommandLineTest)
+QTEST_GUILESS_MAIN(CommandLineTest)
 #include "CommandLineTest.moc"

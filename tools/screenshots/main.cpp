@@ -1,4 +1,4 @@
-// card-screenshots: pictures of the desktop program for the documentation. Run it under a
+// zorbin-screenshots: pictures of the desktop program for the documentation. Run it under a
 // display (scripts/screenshots.sh starts a virtual one): it opens the main window on the demo
 // database's settings (the build's demo, or the settings file given as the second argument), grabs each tab
 // and the dialogs, and writes PNG files into the folder given as its one argument. The collection for the
@@ -11,7 +11,6 @@
 #include "dialogs/LogonDialog.h"
 #include "dialogs/SelectItemDialog.h"
 #include "platform/SettingsStore.h"
-#include "testutil/TestFiles.h"
 
 #include <QApplication>
 #include <QDir>
@@ -45,7 +44,7 @@ int main(int argc, char *argv[])
     QApplication::setApplicationDisplayName(QStringLiteral("זורבין"));
     QApplication::setLayoutDirection(Qt::RightToLeft);
     if (argc != 2 && argc != 3) {
-        std::fprintf(stderr, "usage: card-screenshots FOLDER [SETTINGS.ini]\n");
+        std::fprintf(stderr, "usage: zorbin-screenshots FOLDER [SETTINGS.ini]\n");
         return 2;
     }
     const QDir folder(QString::fromLocal8Bit(argv[1]));
@@ -54,9 +53,9 @@ int main(int argc, char *argv[])
         return 1;
     }
 
-    const QString demoSettings = argc == 3
-                                     ? QString::fromLocal8Bit(argv[2])
-                                     : QDir(test::demoFolder()).filePath(QStringLiteral("demo-settings.ini"));
+    const QString demoSettings =
+        argc == 3 ? QString::fromLocal8Bit(argv[2])
+                  : QDir(QStringLiteral(ZORBIN_DEMO_BUILD_DIR)).filePath(QStringLiteral("demo-settings.ini"));
     const auto store = openIniSettingsStore(demoSettings);
     WidgetUserPort user;
     const auto control = assembleControl(user, *store);
