@@ -1,15 +1,44 @@
 #pragma once
 
 #include "common/Status.h"
+#include "model/UserPort.h"
 
 #include <QString>
 #include <QStringList>
+#include <cstdio>
 
 namespace zorbin {
 struct CatalogSettings;
 }
 
 namespace zorbin::bench {
+
+// A user who watches: the progress bar is kept, nothing is asked, nothing stops the run.
+class QuietUserPort final : public UserPort
+{
+public:
+    Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
+    void tell(const QString &text, const QString &, MessageIcon) override
+    {
+        std::fprintf(stderr, "%s\n", qPrintable(text));
+    }
+    void showStatus(const QString &) override {}
+    int progressFrameWidth() const override { return 1000; }
+    int progressFillWidth() const override { return m_fill; }
+    void setProgressFillWidth(int width) override { m_fill = width; }
+    void yield() override {}
+    Status openBrowser(const QString &) override { return Status::ok(); }
+
+private:
+    int m_fill = 0;
+};
+
+// Ends the benchmark with the failure's text: a figure measured past a failure would mislead.
+inline void fail(const Status &status)
+{
+    if (!status)
+        qFatal("%s", qPrintable(status.description()));
+}
 
 // Writes `count` distinct pictures (PNG and JPEG, of varied sizes, drawn with Qt) into
 // `folder`, and a logo; returns their paths, the logo last.

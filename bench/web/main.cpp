@@ -35,32 +35,6 @@ using namespace zorbin::bench;
 
 namespace {
 
-// A user who watches: the progress bar is kept, nothing is asked, nothing stops the run.
-class QuietUserPort final : public UserPort
-{
-public:
-    Answer ask(const QString &, const QString &, QuestionButtons) override { return Answer::Yes; }
-    void tell(const QString &text, const QString &, MessageIcon) override
-    {
-        std::fprintf(stderr, "%s\n", qPrintable(text));
-    }
-    void showStatus(const QString &) override {}
-    int progressFrameWidth() const override { return 1000; }
-    int progressFillWidth() const override { return m_fill; }
-    void setProgressFillWidth(int width) override { m_fill = width; }
-    void yield() override {}
-    Status openBrowser(const QString &) override { return Status::ok(); }
-
-private:
-    int m_fill = 0;
-};
-
-void fail(const Status &status)
-{
-    if (!status)
-        qFatal("%s", qPrintable(status.description()));
-}
-
 struct Timing
 {
     double seconds = 0;

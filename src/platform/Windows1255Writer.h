@@ -1,6 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
+#include "platform/BlockFile.h"
 #include "platform/Windows1255Encoder.h"
 
 #include <QByteArrayView>
@@ -15,9 +16,8 @@ class FileSystem;
 // A text file of the catalog, written line by line in windows-1255, every line ended by
 // carriage return and line feed (see Windows1255Encoder for characters the code page lacks).
 //
-// Text is encoded as it comes and the bytes handed to the file in large blocks. The first failure to write is
-// kept and every later write is dropped; close() reports it. A writer destroyed without close() writes what
-// it holds and closes the file, ignoring failures.
+// Text is encoded as it comes and the bytes handed to the file in large blocks (see BlockFile for
+// failures and a writer destroyed without close()).
 class Windows1255Writer
 {
 public:
@@ -41,25 +41,18 @@ public:
     void writeEncoded(QByteArrayView bytes);
 
     // Whether every write so far reached the file.
-    bool isOk() const { return m_status.isOk(); }
+    bool isOk() const { return m_file.isOk(); }
     // Writes what is held and closes the file: the first failure, if any.
     Status close();
 
-    const QString &path() const { return m_path; }
+    const QString &path() const { return m_file.path(); }
     // Bytes handed to the file so far.
-    qint64 bytesWritten() const { return m_bytesWritten; }
+    qint64 bytesWritten() const { return m_file.bytesWritten(); }
 
 private:
     Windows1255Writer(std::unique_ptr<QIODevice> device, QString path);
-    void flushIfFull();
-    void flush();
-
-    std::unique_ptr<QIODevice> m_device;
-    QString m_path;
     Windows1255Encoder m_encoder;
-    QByteArray m_bytes; // encoded, not yet handed to the file
-    Status m_status;
-    qint64 m_bytesWritten = 0;
+    BlockFile m_file;
 };
 
 } // namespace zorbin

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "common/Status.h"
+#include "platform/BlockFile.h"
 
 #include <QByteArray>
 #include <QIODevice>
@@ -13,18 +14,13 @@ class FileSystem;
 
 // A text file of the web catalog, in UTF-8 (every character as it is, none as a reference).
 //
-// Bytes are gathered and handed to the file in large blocks. The first failure to write is
-// kept and every later write is dropped; close() reports it. A file destroyed without close()
-// writes what it holds and closes, ignoring failures.
+// Bytes are handed to the file in large blocks (see BlockFile for failures and a file destroyed
+// without close()).
 class SiteFile
 {
 public:
     // Creates the file through `files`, replacing one of that name.
     static Result<std::unique_ptr<SiteFile>> create(FileSystem &files, const QString &path);
-
-    ~SiteFile();
-    SiteFile(const SiteFile &) = delete;
-    SiteFile &operator=(const SiteFile &) = delete;
 
     void write(QStringView text);
     // A working-database value: markup characters go in as their references.
@@ -33,16 +29,12 @@ public:
     void writeBytes(QByteArrayView bytes);
 
     // Writes what is held and closes the file: the first failure, if any.
-    Status close();
+    Status close() { return m_file.close(); }
 
 private:
     SiteFile(std::unique_ptr<QIODevice> device, QString path);
-    void flush();
 
-    std::unique_ptr<QIODevice> m_device;
-    QString m_path;
-    QByteArray m_bytes; // not yet handed to the file
-    Status m_status;
+    BlockFile m_file;
 };
 
 } // namespace zorbin
