@@ -15,8 +15,7 @@ namespace {
 struct Run
 {
     int exitCode = -1;
-    QString out;
-    QString err;
+    QString out, err;
 };
 
 // Runs zorbin-cli with the words of `commandLine` (the demo's settings file in place of
@@ -24,10 +23,10 @@ struct Run
 Run runCli(const QString &commandLine, const DemoScratch &demo)
 {
     QStringList arguments = commandLine.split(QLatin1Char(' '), Qt::SkipEmptyParts);
-    arguments.replaceInStrings(QStringLiteral("SETTINGS"), demo.settingsFile);
+    arguments.replaceInStrings(u"SETTINGS"_qs, demo.settingsFile);
     QProcess process;
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-    environment.insert(QStringLiteral("TMPDIR"), demo.folder.path());
+    environment.insert(u"TMPDIR"_qs, demo.folder.path());
     process.setProcessEnvironment(environment);
     process.setWorkingDirectory(demo.folder.path());
     process.start(QStringLiteral(ZORBIN_CLI), arguments);
@@ -38,10 +37,14 @@ Run runCli(const QString &commandLine, const DemoScratch &demo)
             QString::fromUtf8(process.readAllStandardError())};
 }
 
-void setStored(DemoScratch &demo, const char *key, const char *value)
+// Stores "Key=value" options in the demo's settings file.
+void setStored(DemoScratch &demo, std::initializer_list<const char *> options)
 {
-    demo.store->write(QStringLiteral("Zorbin"), QStringLiteral("Params"), QLatin1String(key),
-                      QLatin1String(value));
+    for (const char *option : options) {
+        const QString text = QString::fromLatin1(option);
+        demo.store->write(u"Zorbin"_qs, u"Params"_qs, text.section(QLatin1Char('='), 0, 0),
+                          text.section(QLatin1Char('='), 1));
+    }
     demo.store->flush();
 }
 
@@ -56,16 +59,12 @@ private Q_SLOTS:
     {
         QTest::addColumn<QString>("commandLine");
         QTest::addColumn<int>("exitCode");
-        for (const auto &[line, exitCode] :
-             std::initializer_list<std::pair<const char *, int>>{{"--help", 0},
-                                                                 {"catalog --help", 0},
-                                                                 {"", 2},
-                                                                 {"print", 2},
-                                                                 {"catalog --colour", 2},
-                                                                 {"list now", 2},
-                                                                 {"catalog --settings /no/such.ini", 2},
-                                                                 {"sql --settings /no/such.ini", 2}})
-            QTest::newRow(*line ? line : "nothing") << QString::fromLatin1(line) << exitCode;
+        // Help succeeds; a command line that is none fails with status 2.
+        for (const char *line : {"--help", "catalog --help"})
+            QTest::newRow(line) << QString::fromLatin1(line) << 0;
+        for (const char *line : {"", "print", "catalog --colour", "list now",
+                                 "catalog --settings /no/such.ini", "sql --settings /no/such.ini"})
+            QTest::newRow(*line ? line : "nothing") << QString::fromLatin1(line) << 2;
     }
     void commandLines()
     {
@@ -80,12 +79,9 @@ private Q_SLOTS:
         QTest::addColumn<QString>("commandLine");
         QTest::addColumn<QString>("printed"); // relative to the scratch folder
         QTest::addColumn<bool>("catalog");
-        QTest::newRow("catalog") << QStringLiteral("catalog --settings SETTINGS")
-                                 << QStringLiteral("catalog/zoindex.htm") << true;
-        QTest::newRow("list") << QStringLiteral("list --settings SETTINGS")
-                              << QStringLiteral("catalog/zorbin3.htm") << false;
-        QTest::newRow("demo") << QStringLiteral("demo --out shop") << QStringLiteral("shop/zoindex.htm")
-                              << true;
+        QTest::newRow("catalog") << u"catalog --settings SETTINGS"_qs << u"catalog/zoindex.htm"_qs << true;
+        QTest::newRow("list") << u"list --settings SETTINGS"_qs << u"catalog/zorbin3.htm"_qs << false;
+        QTest::newRow("demo") << u"demo --out shop"_qs << u"shop/zoindex.htm"_qs << true;
     }
     void wholeRunsOnTheDemo()
     {
@@ -99,42 +95,37 @@ private Q_SLOTS:
         QCOMPARE(run.out, first + QLatin1Char('\n'));
         // 301 items, nine to a page: the first page, 33 more, the stylesheet; or the list alone.
         const QDir folder = QFileInfo(first).dir();
-        const QStringList written = folder.entryList({QStringLiteral("*.htm"), QStringLiteral("*.css")});
+        const QStringList written = folder.entryList({u"*.htm"_qs, u"*.css"_qs});
         QCOMPARE(written.size(), catalog ? 35 : 1);
-        QVERIFY(written.contains(QStringLiteral("zo000034.htm")) == catalog);
-        QVERIFY(folder.exists(QStringLiteral("images/item-11.jpg")) == catalog);
+        QVERIFY(folder.exists(u"images/item-11.jpg"_qs) == catalog);
         if (catalog)
-            QCOMPARE(firstItemKey(first), QStringLiteral("00010"));
+            QCOMPARE(firstItemKey(first), u"00010"_qs);
         else
             QCOMPARE(listRows(first), 301);
     }
 
     // --use-marked makes the catalog of the working database that the last collection left,
-    // marks and all; with none there, the run says what to do and fails.
+    // marks and all.
     void catalogOfTheMarkedItems()
     {
         DemoScratch demo;
-        const QString marked = QStringLiteral("catalog --use-marked --settings SETTINGS");
-        const Run none = runCli(marked, demo);
-        QCOMPARE(none.exitCode, 1);
-        QVERIFY2(none.err.contains(QStringLiteral("בחירת פריטים")), qPrintable(none.err));
-        QCOMPARE(runCli(QStringLiteral("list --settings SETTINGS"), demo).exitCode, 0);
-        const Run run = runCli(marked, demo);
+        QCOMPARE(runCli(u"list --settings SETTINGS"_qs, demo).exitCode, 0);
+        const Run run = runCli(u"catalog --use-marked --settings SETTINGS"_qs, demo);
         QCOMPARE(run.exitCode, 0);
-        QCOMPARE(firstItemKey(demo.out(QStringLiteral("zoindex.htm"))), QStringLiteral("00010"));
-        QVERIFY2(!run.err.contains(QStringLiteral("סורק")), qPrintable(run.err)); // nothing collected
+        QCOMPARE(firstItemKey(demo.out(u"zoindex.htm"_qs)), u"00010"_qs);
+        QVERIFY2(!run.err.contains(u"סורק"_qs), qPrintable(run.err)); // nothing collected
     }
 
     // A run that cannot reach the accounting database says why on standard error and fails.
     void unreachableDatabaseFails()
     {
         DemoScratch demo;
-        setStored(demo, "ConnDataBase", "missing.db");
-        const Run run = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
+        setStored(demo, {"ConnDataBase=missing.db"});
+        const Run run = runCli(u"catalog --settings SETTINGS"_qs, demo);
         QCOMPARE(run.exitCode, 1);
-        QVERIFY2(run.err.contains(QStringLiteral("missing.db")), qPrintable(run.err));
-        QVERIFY2(run.err.contains(QStringLiteral("תקלה")), qPrintable(run.err));
-        QVERIFY(!QFileInfo::exists(demo.out(QStringLiteral("zoindex.htm"))));
+        QVERIFY2(run.err.contains(u"missing.db"_qs), qPrintable(run.err));
+        QVERIFY2(run.err.contains(u"תקלה"_qs), qPrintable(run.err));
+        QVERIFY(!QFileInfo::exists(demo.out(u"zoindex.htm"_qs)));
     }
 
     // Stored numbers are read as the pages have always read them: a band that is no number is left
@@ -143,21 +134,19 @@ private Q_SLOTS:
     void catalogReadsStoredNumbersAsThePagesDo()
     {
         DemoScratch demo;
-        setStored(demo, "TopPercent", "abc");
-        setStored(demo, "BottomPercent", "100");
-        setStored(demo, "ImageW", "0");
-        const Run run = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
+        setStored(demo, {"TopPercent=abc", "BottomPercent=100", "ImageW=0"});
+        const Run run = runCli(u"catalog --settings SETTINGS"_qs, demo);
         QCOMPARE(run.exitCode, 0);
         const QString page = QString::fromLatin1(readFile(run.out.trimmed()));
-        QVERIFY(!page.contains(QStringLiteral("class=Top1")));
-        QVERIFY(page.contains(QRegularExpression(QStringLiteral("<td colspan=\\d+ height='100%'>"))));
-        QVERIFY(page.contains(QStringLiteral("<img src=")));
-        QVERIFY(!page.contains(QRegularExpression(QStringLiteral("<img [^>]* height=\\d"))));
+        QVERIFY(!page.contains(u"class=Top1"_qs));
+        QVERIFY(page.contains(QRegularExpression(u"<td colspan=\\d+ height='100%'>"_qs)));
+        QVERIFY(page.contains(u"<img src="_qs));
+        QVERIFY(!page.contains(QRegularExpression(u"<img [^>]* height=\\d"_qs)));
 
-        setStored(demo, "Rows", "abc");
-        const Run refused = runCli(QStringLiteral("catalog --settings SETTINGS"), demo);
+        setStored(demo, {"Rows=abc"});
+        const Run refused = runCli(u"catalog --settings SETTINGS"_qs, demo);
         QCOMPARE(refused.exitCode, 1);
-        QVERIFY2(refused.err.contains(QStringLiteral("\"שורות\"")), qPrintable(refused.err));
+        QVERIFY2(refused.err.contains(u"\"שורות\""_qs), qPrintable(refused.err));
     }
 
     // Each enabled step prints its statement once, in the order of a run; the password never
@@ -165,37 +154,28 @@ private Q_SLOTS:
     void sqlListsTheStatementsOfARun()
     {
         DemoScratch demo;
-        const QString sql = QStringLiteral("sql --settings SETTINGS");
+        const QString sql = u"sql --settings SETTINGS"_qs;
         const Run run = runCli(sql, demo);
         QCOMPARE(run.exitCode, 0);
         QStringList labels;
         for (const QString &line : run.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts))
             labels << line.section(QLatin1Char(':'), 0, 0);
-        QCOMPARE(labels, (QStringList{QStringLiteral("connection"), QStringLiteral("items"),
-                                      QStringLiteral("sort-groups"), QStringLiteral("price1"),
-                                      QStringLiteral("catalog")}));
-        QVERIFY(run.out.contains(QStringLiteral("PriceListNumber = 1 ")));
+        QCOMPARE(labels, (QStringList{u"connection"_qs, u"items"_qs, u"sort-groups"_qs, u"price1"_qs,
+                                      u"catalog"_qs}));
+        QVERIFY(run.out.contains(u"PriceListNumber = 1 "_qs));
 
         // A server that cannot be reached: no list is filled.
-        for (const auto &[key, value] :
-             std::initializer_list<std::pair<const char *, const char *>>{{"ConnType", "0"},
-                                                                          {"ConnUID", "shop"},
-                                                                          {"ConnPWD", "s3cret"},
-                                                                          {"UsePriceField", "0"},
-                                                                          {"UseCatCode", "1"},
-                                                                          {"FromSort", "10"},
-                                                                          {"UseExtraNote2", "1"}})
-            setStored(demo, key, value);
+        setStored(demo, {"ConnType=0", "ConnUID=shop", "ConnPWD=s3cret", "UsePriceField=0", "UseCatCode=1",
+                         "FromSort=10", "UseExtraNote2=1"});
         const Run noNote = runCli(sql, demo);
         QCOMPARE(noNote.exitCode, 1);
-        QVERIFY2(noNote.err.contains(QStringLiteral("נתון נוסף 2")), qPrintable(noNote.err));
-        setStored(demo, "UseExtraNote2", "0");
+        QVERIFY2(noNote.err.contains(u"נתון נוסף 2"_qs), qPrintable(noNote.err));
+        setStored(demo, {"UseExtraNote2=0"});
         const Run listed = runCli(sql, demo);
         QCOMPARE(listed.exitCode, 0);
-        QVERIFY(listed.out.startsWith(QStringLiteral("connection: driver={SQL Server};")));
-        QVERIFY(listed.out.contains(QStringLiteral(";uid=shop;pwd=")) &&
-                !listed.out.contains(QLatin1String("s3cret")));
-        QVERIFY(listed.out.contains(QStringLiteral(" And Items.SortGroup >= 10")));
+        QVERIFY(listed.out.startsWith(u"connection: driver={SQL Server};"_qs));
+        QVERIFY(listed.out.contains(u";uid=shop;pwd="_qs) && !listed.out.contains(QLatin1String("s3cret")));
+        QVERIFY(listed.out.contains(u" And Items.SortGroup >= 10"_qs));
     }
 };
 

@@ -1,6 +1,7 @@
 #include "control/CatalogControl.h"
 
 #include "output/CopiedPictures.h"
+#include "testutil/CaseTable.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/MemorySettingsStore.h"
 #include "testutil/RecordingStages.h"
@@ -28,25 +29,44 @@ struct Rig
         control = std::make_unique<CatalogControl>(user, store, files, std::move(made));
         control->settings().outputFolder = output;
         control->settings().pageSplit = PageSplit::FilePerPage;
-        stages->firstPage = out(QStringLiteral("zoindex.htm"));
+        stages->firstPage = out(u"zoindex.htm"_qs);
     }
 
     QString out(const QString &name = {}) const { return output + QLatin1Char('/') + name; }
     bool has(const char *stage) const { return stages->names().contains(QLatin1String(stage)); }
-    // The one message the user was told.
-    RecordingUserPort::Message told() const
-    {
-        return user.messages.size() == 1 ? user.messages.constFirst()
-                                         : RecordingUserPort::Message{{}, {}, MessageIcon::Question};
-    }
 
     QTemporaryDir folder;
-    QString output = QDir(folder.path()).filePath(QStringLiteral("catalog"));
+    QString output = QDir(folder.path()).filePath(u"catalog"_qs);
     MemorySettingsStore store;
     RecordingUserPort user;
     FaultyFileSystem files;
     RecordingStages *stages = nullptr;
     std::unique_ptr<CatalogControl> control;
+};
+
+// What each failure does to a run: a failed collection step is told with the information icon
+// and the output is still written from what was collected; any other fault is told as a fault
+// and ends the run where it happened. `shown`: the result was handed to the browser.
+const struct
+{
+    const char *name; // what fails; "list: " for a list run
+    bool list;
+    Ending ending;
+    int stagesRun;
+    bool shown;
+} Failures[] = {
+    {"collection cannot start", false, Ending::Failed, 1, false},
+    {"collection step", false, Ending::Partial, 4, true},
+    {"pictures", false, Ending::Failed, 2, false},
+    {"pages", false, Ending::Failed, 3, false},
+    {"stylesheet", false, Ending::Failed, 4, false},
+    {"browser", false, Ending::Failed, 4, true},
+    {"page file in use", false, Ending::Failed, 1, false},
+    {"output folder two levels deep", false, Ending::Failed, 1, false},
+    {"marked items, none collected", false, Ending::Failed, 0, false},
+    {"list: collection step", true, Ending::Partial, 2, true},
+    {"list: list page", true, Ending::Failed, 2, false},
+    {"list: marked items, none collected", true, Ending::Failed, 0, false},
 };
 
 } // namespace
@@ -61,11 +81,10 @@ private Q_SLOTS:
         Rig rig;
         QCOMPARE(rig.control->askAndMakeCatalog().ending, Ending::Complete);
         QCOMPARE(rig.user.questionButtons.value(0), QuestionButtons::YesNo);
-        QCOMPARE(rig.stages->names(),
-                 (QStringList{QStringLiteral("BuildAndCollectData"), QStringLiteral("CollectCatImages"),
-                              QStringLiteral("CreateCatHTML"), QStringLiteral("CreateCSS")}));
-        QCOMPARE(rig.stages->calls.constLast(), QStringLiteral("CreateCSS(%1,true)").arg(rig.out()));
-        QCOMPARE(rig.user.browsed, QStringList{rig.out(QStringLiteral("zoindex.htm"))});
+        QCOMPARE(rig.stages->names(), (QStringList{u"BuildAndCollectData"_qs, u"CollectCatImages"_qs,
+                                                   u"CreateCatHTML"_qs, u"CreateCSS"_qs}));
+        QCOMPARE(rig.stages->calls.constLast(), u"CreateCSS(%1,true)"_qs.arg(rig.out()));
+        QCOMPARE(rig.user.browsed, QStringList{rig.out(u"zoindex.htm"_qs)});
         QCOMPARE(rig.user.busyChanges, (QList<bool>{true, false}));
 
         rig.stages->calls.clear(); // one file holds every page: no pictures are copied
@@ -78,16 +97,16 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.control->settings().useMarkedItems = true;
-        rig.control->runState().WorkDBFile = QStringLiteral("/tmp/marked.tmp");
+        rig.control->runState().WorkDBFile = u"/tmp/marked.tmp"_qs;
         QCOMPARE(rig.control->makeCatalog().ending, Ending::Complete);
         QVERIFY(!rig.has("BuildAndCollectData"));
-        QVERIFY(rig.stages->calls.value(1).startsWith(
-            QStringLiteral("CreateCatHTML(%1zo,/tmp/marked.tmp,").arg(rig.out())));
+        QVERIFY(
+            rig.stages->calls.value(1).startsWith(u"CreateCatHTML(%1zo,/tmp/marked.tmp,"_qs.arg(rig.out())));
 
         rig.stages->calls.clear(); // the list asks whether to collect them again
         rig.user.answers = {Answer::No, Answer::Yes};
         rig.control->askAndMakeList();
-        QCOMPARE(rig.stages->names(), QStringList{QStringLiteral("CreateListHTML")});
+        QCOMPARE(rig.stages->names(), QStringList{u"CreateListHTML"_qs});
         rig.control->askAndMakeList();
         QVERIFY(rig.has("BuildAndCollectData"));
         QCOMPARE(rig.user.questionButtons.value(1), QuestionButtons::YesNoCancel);
@@ -102,7 +121,7 @@ private Q_SLOTS:
         for (int opening = 0; opening < 3; ++opening)
             QCOMPARE(rig.control->prepareMarking().file, rig.stages->workDBFile);
         QCOMPARE(rig.user.questions.size(), 2);
-        QCOMPARE(rig.stages->names().count(QStringLiteral("BuildAndCollectData")), 2);
+        QCOMPARE(rig.stages->names().count(u"BuildAndCollectData"_qs), 2);
         QVERIFY(rig.control->settings().useMarkedItems);
     }
 
@@ -123,16 +142,16 @@ private Q_SLOTS:
     {
         Rig rig;
         rig.control->settings().outputFolder = rig.output + QLatin1Char('/');
-        QCOMPARE(rig.control->makeList(true).file, rig.out(QStringLiteral("zorbin3.htm")));
+        QCOMPARE(rig.control->makeList(true).file, rig.out(u"zorbin3.htm"_qs));
         rig.control->makeCatalog();
-        QVERIFY(QFileInfo(rig.out(QStringLiteral("images"))).isDir());
+        QVERIFY(QFileInfo(rig.out(u"images"_qs)).isDir());
 
         const QByteArray saved = qgetenv("TMPDIR"); // no folder at all: the temporary folder
         qputenv("TMPDIR", rig.folder.path().toUtf8());
         rig.control->settings().outputFolder.clear();
         rig.control->makeCatalog();
         qputenv("TMPDIR", saved);
-        QCOMPARE(rig.stages->calls.constLast(), QStringLiteral("CreateCSS(%1/,true)").arg(rig.folder.path()));
+        QCOMPARE(rig.stages->calls.constLast(), u"CreateCSS(%1/,true)"_qs.arg(rig.folder.path()));
     }
 
     // Only what catalog runs wrote is removed: their pages, the list page and the pictures they
@@ -141,100 +160,68 @@ private Q_SLOTS:
     void cleanUpRemovesOnlyTheCatalogsOwnFiles()
     {
         Rig rig;
-        QDir().mkpath(rig.out(QStringLiteral("images/mine")));
-        const QStringList ours = {QStringLiteral("zoindex.htm"), QStringLiteral("zo000002.htm"),
-                                  QStringLiteral("zo1234567.htm"), QStringLiteral("zorbin3.htm"),
-                                  QStringLiteral("images/A1.JPG")};
-        const QStringList theirs = {QStringLiteral("index.htm"), QStringLiteral("zo12.htm"),
-                                    QStringLiteral("notes.txt"), QStringLiteral("zoindex.html"),
-                                    QStringLiteral("images/mine.png")};
+        QDir().mkpath(rig.out(u"images/mine"_qs));
+        const QStringList ours = {u"zoindex.htm"_qs, u"zo000002.htm"_qs, u"zo1234567.htm"_qs,
+                                  u"zorbin3.htm"_qs, u"images/A1.JPG"_qs};
+        const QStringList theirs = {u"index.htm"_qs, u"zo12.htm"_qs, u"notes.txt"_qs, u"zoindex.html"_qs,
+                                    u"images/mine.png"_qs};
         for (const QString &name : ours + theirs)
             writeFile(rig.out(name));
         {
-            CopiedPictures record(rig.files, rig.out(QStringLiteral("images")));
+            CopiedPictures record(rig.files, rig.out(u"images"_qs));
             for (const char *name : {"A1.JPG", "../notes.txt", ".", "mine"})
                 QVERIFY(record.add(QLatin1String(name)));
         }
         QCOMPARE(rig.control->makeCatalog().ending, Ending::Complete);
         for (const QString &name : ours)
             QVERIFY2(!QFileInfo::exists(rig.out(name)), qPrintable(name));
-        for (const QString &name : theirs + QStringList{QStringLiteral("images/mine")})
+        for (const QString &name : theirs + QStringList{u"images/mine"_qs})
             QVERIFY2(QFileInfo::exists(rig.out(name)), qPrintable(name));
-        QVERIFY(!QFileInfo::exists(CopiedPictures::recordPath(rig.out(QStringLiteral("images")))));
+        QVERIFY(!QFileInfo::exists(CopiedPictures::recordPath(rig.out(u"images"_qs))));
     }
 
-    // What each failure does to a run: a failed collection step is told with the information
-    // icon and the output is still written from what was collected; any other fault is told as
-    // a fault and ends the run where it happened.
-    void aFailureEndsTheRunOrWarns_data()
-    {
-        QTest::addColumn<QString>("failing");
-        QTest::addColumn<bool>("list");
-        QTest::addColumn<Ending>("ending");
-        QTest::addColumn<int>("stagesRun");
-        QTest::addColumn<bool>("shown"); // the result was handed to the browser
-        auto row = [](const char *failing, bool list, Ending ending, int stagesRun, bool shown) {
-            QTest::newRow(failing) << QString::fromLatin1(failing) << list << ending << stagesRun << shown;
-        };
-        row("collection cannot start", false, Ending::Failed, 1, false);
-        row("collection step", false, Ending::Partial, 4, true);
-        row("pictures", false, Ending::Failed, 2, false);
-        row("pages", false, Ending::Failed, 3, false);
-        row("stylesheet", false, Ending::Failed, 4, false);
-        row("browser", false, Ending::Failed, 4, true);
-        row("page file in use", false, Ending::Failed, 1, false);
-        row("output folder two levels deep", false, Ending::Failed, 1, false);
-        row("marked items, none collected", false, Ending::Failed, 0, false);
-        row("list: collection step", true, Ending::Partial, 2, true);
-        row("list: list page", true, Ending::Failed, 2, false);
-        row("list: browser", true, Ending::Failed, 2, true);
-        row("list: marked items, none collected", true, Ending::Failed, 0, false);
-    }
+    void aFailureEndsTheRunOrWarns_data() { addCaseRows(Failures); }
     void aFailureEndsTheRunOrWarns()
     {
-        QFETCH(QString, failing);
-        QFETCH(bool, list);
-        QFETCH(Ending, ending);
-        QFETCH(int, stagesRun);
-        QFETCH(bool, shown);
+        const auto &[failing, list, ending, stagesRun, shown] = fetchCase(Failures);
         Rig rig;
-        QString text = QStringLiteral("פריט K6: הטקסט ארוך מדי"); // a part of what the user is told
-        const QString page = rig.out(QStringLiteral("zo000002.htm"));
+        QString text = u"פריט K6: הטקסט ארוך מדי"_qs; // a part of what the user is told
+        const QString page = rig.out(u"zo000002.htm"_qs);
         const QMap<QString, std::function<void()>> failures = {
-            {QStringLiteral("collection cannot start"),
-             [&] { rig.stages->collectResult = Status::fault(text); }},
-            {QStringLiteral("collection step"), [&] { rig.stages->stepFailure = Status::fault(text); }},
-            {QStringLiteral("pictures"), [&] { rig.stages->imagesResult = Status::fault(text); }},
-            {QStringLiteral("pages"), [&] { rig.stages->pagesResult = Status::fault(text); }},
-            {QStringLiteral("stylesheet"), [&] { rig.stages->cssResult = Status::fault(text); }},
-            {QStringLiteral("list page"), [&] { rig.stages->listResult = Status::fault(text); }},
-            {QStringLiteral("browser"), [&] { rig.user.browserResult = Status::fault(text); }},
-            {QStringLiteral("page file in use"),
+            {u"collection cannot start"_qs, [&] { rig.stages->collectResult = Status::fault(text); }},
+            {u"collection step"_qs, [&] { rig.stages->stepFailure = Status::fault(text); }},
+            {u"pictures"_qs, [&] { rig.stages->imagesResult = Status::fault(text); }},
+            {u"pages"_qs, [&] { rig.stages->pagesResult = Status::fault(text); }},
+            {u"stylesheet"_qs, [&] { rig.stages->cssResult = Status::fault(text); }},
+            {u"list page"_qs, [&] { rig.stages->listResult = Status::fault(text); }},
+            {u"browser"_qs, [&] { rig.user.browserResult = Status::fault(text); }},
+            {u"page file in use"_qs,
              [&] {
                  QDir().mkpath(rig.output);
                  writeFile(page);
                  rig.files.failingPaths.insert(page);
                  text = page;
              }},
-            {QStringLiteral("output folder two levels deep"),
-             [&] { rig.control->settings().outputFolder = text = rig.out(QStringLiteral("a/b")); }},
-            {QStringLiteral("marked items, none collected"), [&] {
+            {u"output folder two levels deep"_qs,
+             [&] { rig.control->settings().outputFolder = text = rig.out(u"a/b"_qs); }},
+            {u"marked items, none collected"_qs, [&] {
                  rig.control->settings().useMarkedItems = true;
-                 text = QStringLiteral("\"בחירת פריטים...\"");
+                 text = u"\"בחירת פריטים...\""_qs;
              }}};
-        failures.value(failing.section(QStringLiteral(": "), -1))();
+        failures.value(QString::fromLatin1(failing).section(u": "_qs, -1))();
         const RunOutcome outcome = list ? rig.control->makeList(!rig.control->settings().useMarkedItems)
                                         : rig.control->makeCatalog();
         QCOMPARE(outcome.ending, ending);
         QVERIFY2(outcome.message.contains(text), qPrintable(outcome.message));
-        QVERIFY(rig.told().text.contains(text));
-        QCOMPARE(rig.told().icon,
+        QCOMPARE(rig.user.messages.size(), 1); // told once
+        QVERIFY(rig.user.messages[0].text.contains(text));
+        QCOMPARE(rig.user.messages[0].icon,
                  ending == Ending::Partial ? MessageIcon::Information : MessageIcon::Critical);
         QCOMPARE(rig.stages->names().size(), stagesRun);
         QCOMPARE(rig.user.browsed.size(), shown ? 1 : 0);
         QCOMPARE(outcome.file, rig.user.browsed.value(0));
         QVERIFY(!rig.control->isRunning());
-        QCOMPARE(QFileInfo::exists(rig.out()), stagesRun > 1 || failing.contains(QStringLiteral("in use")));
+        QCOMPARE(QFileInfo::exists(rig.out()), stagesRun > 1 || QByteArray(failing).contains("in use"));
     }
 
     void catalogWithoutItemsOpensNoWindow()
@@ -242,8 +229,9 @@ private Q_SLOTS:
         Rig rig;
         rig.stages->firstPage.clear();
         QCOMPARE(rig.control->makeCatalog().ending, Ending::NoItems);
-        QCOMPARE(rig.told().icon, MessageIcon::Information);
-        rig.stages->stepFailure = Status::fault(QStringLiteral("step")); // partial says more
+        QCOMPARE(rig.user.messages.size(), 1);
+        QCOMPARE(rig.user.messages[0].icon, MessageIcon::Information);
+        rig.stages->stepFailure = Status::fault(u"step"_qs); // partial says more
         QCOMPARE(rig.control->makeCatalog().ending, Ending::Partial);
         QVERIFY(rig.user.browsed.isEmpty());
     }
@@ -254,7 +242,7 @@ private Q_SLOTS:
     void stopRequestIsClearedWhereRunsStart()
     {
         Rig rig;
-        QString stopIn = QStringLiteral("BuildAndCollectData");
+        QString stopIn = u"BuildAndCollectData"_qs;
         rig.stages->during = [&](const QString &stage) {
             if (stage == stopIn)
                 rig.control->requestStop();
@@ -284,7 +272,7 @@ private Q_SLOTS:
             nested = {rig.control->askAndMakeCatalog().ending, rig.control->askAndMakeList().ending,
                       rig.control->makeCatalog().ending,       rig.control->makeList(true).ending,
                       rig.control->collectItems().ending,      rig.control->prepareMarking().ending};
-            rig.control->settings().topTitle = QStringLiteral("changed");
+            rig.control->settings().topTitle = u"changed"_qs;
             rig.control->saveSettings();
         };
         rig.control->makeCatalog();
@@ -293,7 +281,7 @@ private Q_SLOTS:
         QCOMPARE(rig.store.writes, 0);
         QVERIFY(!rig.control->isRunning());
         rig.control->saveSettings();
-        QCOMPARE(rig.store.get(QStringLiteral("TopTitle")), QStringLiteral("changed"));
+        QCOMPARE(rig.store.get(u"TopTitle"_qs), u"changed"_qs);
     }
 };
 

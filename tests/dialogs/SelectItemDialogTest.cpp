@@ -2,9 +2,6 @@
 
 #include "dialogs/ItemListModel.h"
 #include "testutil/WorkDatabaseFixture.h"
-#include "workdb/RowWriter.h"
-#include "workdb/WorkDatabase.h"
-#include "workdb/WorkSchema.h"
 
 #include <QLabel>
 #include <QLineEdit>
@@ -22,7 +19,7 @@ QStringList listedKeys(const frmSelectItem &dialog)
 {
     QStringList keys;
     for (const SelectableItem &item : dialog.model()->items())
-        keys << item.key + (item.include ? QString() : QStringLiteral(" -"));
+        keys << item.key + (item.include ? QString() : u" -"_qs);
     return keys;
 }
 
@@ -30,7 +27,7 @@ QStringList listedKeys(const frmSelectItem &dialog)
 QMap<QString, bool> storedMarks(const QString &path)
 {
     QMap<QString, bool> marks;
-    for (const QVariantList &row : readWorkTable(path, QStringLiteral("tItems")))
+    for (const QVariantList &row : readWorkTable(path, u"tItems"_qs))
         marks.insert(row.at(0).toString(), row.at(8).toInt() != 0);
     return marks;
 }
@@ -50,17 +47,16 @@ private Q_SLOTS:
     // Six items, four of them marked, Hebrew and Latin keys in mixed letter case.
     void init()
     {
-        m_path = m_folder.filePath(QStringLiteral("zorbindb.tmp"));
+        m_path = m_folder.filePath(u"zorbindb.tmp"_qs);
+        const std::tuple<const char *, const char *, bool> items[] = {
+            {"ab200", "Abacus small", false}, {"x9", "Abacus", true},
+            {"AB300", "לוח", true},           {"A100", "עט", true},
+            {"א-5", "שולחן", false},          {"ב-10", "כיסא", true}};
         WorkRows rows;
-        const QStringList keys = {QStringLiteral("ab200"), QStringLiteral("x9"),  QStringLiteral("AB300"),
-                                  QStringLiteral("A100"),  QStringLiteral("א-5"), QStringLiteral("ב-10")};
-        const QStringList names = {QStringLiteral("Abacus small"), QStringLiteral("Abacus"),
-                                   QStringLiteral("לוח"),          QStringLiteral("עט"),
-                                   QStringLiteral("שולחן"),        QStringLiteral("כיסא")};
-        for (int i = 0; i < keys.size(); ++i) {
-            rows.items << WorkItem(keys.at(i));
-            rows.items.last().name = names.at(i);
-            rows.items.last().include = i != 0 && i != 4;
+        for (const auto &[key, name, marked] : items) {
+            rows.items << WorkItem(QString::fromUtf8(key));
+            rows.items.last().name = QString::fromUtf8(name);
+            rows.items.last().include = marked;
         }
         QVERIFY(makeWorkDatabase(m_path, rows).isOk());
     }
@@ -70,10 +66,8 @@ private Q_SLOTS:
     {
         frmSelectItem dialog(m_path);
         QCOMPARE(listedKeys(dialog),
-                 (QStringList{QStringLiteral("ב-10"), QStringLiteral("A100"), QStringLiteral("AB300"),
-                              QStringLiteral("x9"), QStringLiteral("א-5 -"), QStringLiteral("ab200 -")}));
-        QCOMPARE(dialog.model()->index(0, ItemListModel::NameColumn).data().toString(),
-                 QStringLiteral("כיסא"));
+                 (QStringList{u"ב-10"_qs, u"A100"_qs, u"AB300"_qs, u"x9"_qs, u"א-5 -"_qs, u"ab200 -"_qs}));
+        QCOMPARE(dialog.model()->index(0, ItemListModel::NameColumn).data().toString(), u"כיסא"_qs);
         QCOMPARE(dialog.model()->index(4, ItemListModel::IncludeColumn).data(Qt::CheckStateRole),
                  QVariant(Qt::Unchecked));
     }
@@ -83,12 +77,12 @@ private Q_SLOTS:
         QTest::addColumn<bool>("byKey");
         QTest::addColumn<QString>("text");
         QTest::addColumn<int>("foundRow"); // -1: the current row stays
-        QTest::newRow("key, small letters") << true << QStringLiteral("ab") << 2;
-        QTest::newRow("key, capitals") << true << QStringLiteral("AB2") << 5;
-        QTest::newRow("key, Hebrew") << true << QStringLiteral("א") << 4;
-        QTest::newRow("name, from the top") << false << QStringLiteral("ABAC") << 3;
-        QTest::newRow("name, Hebrew") << false << QStringLiteral("שול") << 4;
-        QTest::newRow("name, only in the middle") << false << QStringLiteral("bacus") << -1;
+        QTest::newRow("key, small letters") << true << u"ab"_qs << 2;
+        QTest::newRow("key, capitals") << true << u"AB2"_qs << 5;
+        QTest::newRow("key, Hebrew") << true << u"א"_qs << 4;
+        QTest::newRow("name, from the top") << false << u"ABAC"_qs << 3;
+        QTest::newRow("name, Hebrew") << false << u"שול"_qs << 4;
+        QTest::newRow("name, only in the middle") << false << u"bacus"_qs << -1;
         QTest::newRow("empty") << true << QString() << -1;
     }
     void searchesFindAPrefixInEitherCase()
@@ -100,9 +94,7 @@ private Q_SLOTS:
         QTableView *grid = dialog.grid();
         const QModelIndex before = dialog.model()->index(1, ItemListModel::NameColumn);
         grid->setCurrentIndex(before);
-        dialog
-            .findChild<QLineEdit *>(byKey ? QStringLiteral("txtToItemkey") : QStringLiteral("txtToItemName"))
-            ->setText(text);
+        dialog.findChild<QLineEdit *>(byKey ? u"txtToItemkey"_qs : u"txtToItemName"_qs)->setText(text);
         for (int search = 0; search < 2; ++search) { // from the top again: the same row a second time
             click(dialog, byKey ? "cmdFindKey" : "cmdFindByDesc");
             QCOMPARE(grid->currentIndex(),
@@ -120,8 +112,7 @@ private Q_SLOTS:
         QCOMPARE(dialog.model()->rowCount(), 4);
         QCOMPARE(dialog.model()->data(fifth, Qt::TextAlignmentRole), QVariant());
         click(dialog, "cmdNoneItems");
-        QCOMPARE(listedKeys(dialog), (QStringList{QStringLiteral("ב-10 -"), QStringLiteral("A100 -"),
-                                                  QStringLiteral("AB300 -"), QStringLiteral("x9 -")}));
+        QCOMPARE(listedKeys(dialog), (QStringList{u"ב-10 -"_qs, u"A100 -"_qs, u"AB300 -"_qs, u"x9 -"_qs}));
         QCOMPARE(storedMarks(m_path).values(), QList<bool>(6, false));
         click(dialog, "cmdShowMarked");
         QCOMPARE(dialog.model()->rowCount(), 0);
@@ -129,7 +120,7 @@ private Q_SLOTS:
         click(dialog, "cmdShowAll");
         click(dialog, "CmdAllItems");
         QCOMPARE(storedMarks(m_path).values(), QList<bool>(6, true));
-        QVERIFY(dialog.findChild<QLabel *>(QStringLiteral("DataItems"))->text().contains(QLatin1Char('6')));
+        QVERIFY(dialog.findChild<QLabel *>(u"DataItems"_qs)->text().contains(QLatin1Char('6')));
     }
 
     // A mark changed in the list is stored at once; the item keeps its row until a reload, and
@@ -143,20 +134,20 @@ private Q_SLOTS:
                                    Qt::CheckStateRole));
             QVERIFY(!model->setData(model->index(1, ItemListModel::KeyColumn), Qt::Unchecked,
                                     Qt::CheckStateRole));
-            QVERIFY(!storedMarks(m_path).value(QStringLiteral("A100")));
-            QCOMPARE(listedKeys(dialog).at(1), QStringLiteral("A100 -"));
+            QVERIFY(!storedMarks(m_path).value(u"A100"_qs));
+            QCOMPARE(listedKeys(dialog).at(1), u"A100 -"_qs);
             click(dialog, "cmdClose");
             QCOMPARE(dialog.result(), int(QDialog::Accepted));
         }
         frmSelectItem again(m_path);
-        QCOMPARE(listedKeys(again).at(4), QStringLiteral("A100 -"));
+        QCOMPARE(listedKeys(again).at(4), u"A100 -"_qs);
     }
 
     void aMissingDatabaseLeavesTheListEmptyAndSaysWhy()
     {
-        frmSelectItem dialog(m_folder.filePath(QStringLiteral("none.tmp")));
+        frmSelectItem dialog(m_folder.filePath(u"none.tmp"_qs));
         QCOMPARE(dialog.model()->rowCount(), 0);
-        QVERIFY(!dialog.findChild<QLabel *>(QStringLiteral("DataItems"))->text().isEmpty());
+        QVERIFY(!dialog.findChild<QLabel *>(u"DataItems"_qs)->text().isEmpty());
         click(dialog, "CmdAllItems"); // nothing to do, no fault
         QCOMPARE(dialog.model()->rowCount(), 0);
     }
@@ -164,22 +155,14 @@ private Q_SLOTS:
     void listsLongerThanSixteenBitRowNumbers()
     {
         const int count = 33000;
-        const QString path = m_folder.filePath(QStringLiteral("long.tmp"));
-        QVERIFY(makeWorkDatabase(path).isOk());
-        {
-            auto work = WorkDatabase::open(path);
-            QVERIFY(work.isOk() && work.value()->begin().isOk());
-            RowWriter writer(
-                *work.value(), QStringLiteral("tItems"),
-                {QStringLiteral("ItemKey"), QStringLiteral("ItemName"), QStringLiteral("Include")});
-            for (int i = 0; i < count; ++i)
-                QVERIFY(writer.write(QVariantList{QStringLiteral("K%1").arg(i, 6, 10, QLatin1Char('0')),
-                                                  QString(), WorkTrue}));
-            QVERIFY(work.value()->commit().isOk());
-        }
+        const QString path = m_folder.filePath(u"long.tmp"_qs);
+        WorkRows rows;
+        for (int i = 0; i < count; ++i)
+            rows.items << WorkItem(u"K%1"_qs.arg(i, 6, 10, QLatin1Char('0')));
+        QVERIFY(makeWorkDatabase(path, rows).isOk());
         frmSelectItem dialog(path);
         QCOMPARE(dialog.model()->rowCount(), count);
-        dialog.findChild<QLineEdit *>(QStringLiteral("txtToItemkey"))->setText(QStringLiteral("k032999"));
+        dialog.findChild<QLineEdit *>(u"txtToItemkey"_qs)->setText(u"k032999"_qs);
         click(dialog, "cmdFindKey");
         QCOMPARE(dialog.grid()->currentIndex().row(), count - 1);
         click(dialog, "cmdNoneItems");

@@ -1,13 +1,16 @@
-// The code page of the catalog files: the encoder against the system's ICU converter, and the
-// writer's escaping, line ends, blocks and failures.
+// How the catalog files are written: the code page (the encoder against the system's ICU
+// converter, and the writer's escaping, line ends, blocks and failures) and the number and date
+// formats with the system's separators.
 #include "platform/ForwardingFileSystem.h"
+#include "platform/ValueFormat.h"
 #include "platform/Windows1255Encoder.h"
 #include "platform/Windows1255Writer.h"
 #include "testutil/TestFiles.h"
-#include "testutil/TestMain.h"
 
+#include <QLocale>
 #include <QTemporaryDir>
 #include <QTest>
+#include <limits>
 #include <unicode/ucnv.h>
 #include <unicode/ucnv_cb.h>
 
@@ -15,21 +18,22 @@ using namespace zorbin;
 
 namespace {
 
+// A device on a full disk: it opens, and every write fails.
+class FullDevice final : public QIODevice
+{
+public:
+    FullDevice()
+    {
+        open(WriteOnly);
+        setErrorString(u"No space left on device"_qs);
+    }
+    qint64 readData(char *, qint64) override { return -1; }
+    qint64 writeData(const char *, qint64) override { return -1; }
+};
+
 // The local file system, except that every file opened for writing is on a full disk.
 class FullDiskFileSystem final : public ForwardingFileSystem
 {
-    class FullDevice final : public QIODevice
-    {
-    public:
-        FullDevice()
-        {
-            open(WriteOnly);
-            setErrorString(u"No space left on device"_qs);
-        }
-        qint64 readData(char *, qint64) override { return -1; }
-        qint64 writeData(const char *, qint64) override { return -1; }
-    };
-
 public:
     Result<std::unique_ptr<QIODevice>> openForWriting(const QString &) override
     {
@@ -58,27 +62,22 @@ QByteArray icuEncoded(QStringView text)
 QStringList allTexts(const QList<char16_t> &units, int length)
 {
     QStringList texts{QString()};
-    QStringList shorter = texts;
-    for (int i = 0; i < length; ++i) {
-        QStringList longer;
-        for (const QString &text : std::as_const(shorter)) {
+    for (qsizetype from = 0; length-- > 0;) {
+        const qsizetype to = texts.size();
+        for (qsizetype i = from; i < to; ++i) {
             for (const char16_t unit : units)
-                longer << text + QChar(unit);
+                texts << texts.at(i) + QChar(unit);
         }
-        texts += longer;
-        shorter = longer;
+        from = to;
     }
     return texts;
 }
 
 } // namespace
 
-class EncodingTest : public QObject
+class FileFormatTest : public QObject
 {
     Q_OBJECT
-
-private:
-    QTemporaryDir m_dir;
 
 private Q_SLOTS:
     void everyCharacterAsIcuHasIt()
@@ -115,7 +114,8 @@ private Q_SLOTS:
     // replacing a longer file.
     void writer()
     {
-        const QString path = m_dir.filePath(u"page.htm"_qs);
+        QTemporaryDir folder;
+        const QString path = folder.filePath(u"page.htm"_qs);
         test::writeFile(path, QByteArray(1 << 20, 'x'));
         auto created = Windows1255Writer::create(localFileSystem(), path);
         QVERIFY(created.isOk());
@@ -145,15 +145,74 @@ private Q_SLOTS:
     void writeFailureIsReported()
     {
         FullDiskFileSystem files;
-        auto writer = Windows1255Writer::create(files, m_dir.filePath(u"full.htm"_qs));
+        auto writer = Windows1255Writer::create(files, u"full.htm"_qs);
         QVERIFY(writer.isOk());
         writer.value()->writeLine(u"x");
         const Status closed = writer.value()->close();
         QVERIFY(!closed.isOk());
-        QVERIFY(closed.description().contains(u"No space left on device"_qs));
+        QVERIFY2(closed.description().contains(u"No space left on device"_qs),
+                 qPrintable(closed.description()));
         QVERIFY(!writer.value()->isOk());
+    }
+
+    // The golden catalogs show the common amounts, the date and the C locale's separators.
+    void amounts()
+    {
+        const std::pair<double, QString> cases[] = {
+            {-98765.432, u"-98,765.43"_qs},
+            {0.125, u"0.13"_qs}, // a half cent away from zero
+            // Typed half cents whose doubles lie a hair below the half (2.67499999999999982...).
+            {2.675, u"2.68"_qs},
+            {0.285, u"0.29"_qs},
+            {1.005, u"1.01"_qs},
+            {-2.675, u"-2.68"_qs},
+            {1.0049, u"1.00"_qs},
+            {9999999999999.99, u"9,999,999,999,999.99"_qs},
+            {999.999, u"1,000.00"_qs},
+            {-0.001, u"0.00"_qs}, // no sign when it rounds to zero
+            // A corrupt price far beyond any amount of money is printed, not overrun.
+            {-1e40, u"-10,000,000,000,000,000,000,000,000,000,000,000,000,000.00"_qs},
+            {std::numeric_limits<double>::max(),
+             u"179,769,313,486,232"_qs + u",000"_qs.repeated(98) + u".00"_qs},
+        };
+        for (const auto &[value, expected] : cases)
+            QCOMPARE(formatAmount(value, Separators()), expected);
+    }
+
+    void separatorsAsGiven()
+    {
+        Separators separators;
+        separators.group = u"."_qs;
+        separators.decimal = u","_qs;
+        separators.date = u"-"_qs;
+        QCOMPARE(formatAmount(1234567.891, separators), u"1.234.567,89"_qs);
+        QCOMPARE(formatDate(QDate(999, 12, 31), separators), u"31-12-0999"_qs);
+    }
+
+    void systemSeparators()
+    {
+        const std::pair<QLocale, QStringList> cases[] = {
+            {QLocale(QLocale::German, QLocale::Germany), {u"."_qs, u","_qs, u"."_qs}},
+            {QLocale(QLocale::Hebrew, QLocale::Israel), {u","_qs, u"."_qs, u"."_qs}},
+        };
+        const QLocale saved;
+        for (const auto &[locale, expected] : cases) {
+            QLocale::setDefault(locale);
+            const Separators separators = Separators::ofSystem();
+            QLocale::setDefault(saved);
+            QCOMPARE((QStringList{separators.group, separators.decimal, separators.date}), expected);
+        }
+    }
+
+    // The stylesheet's percentages beyond those of the golden catalogs.
+    void oneDecimal()
+    {
+        QCOMPARE(formatOneDecimal(100.0 / 16), u"06.3"_qs); // a half away from zero
+        QCOMPARE(formatOneDecimal(100.0 / 1.5), u"66.7"_qs);
+        QCOMPARE(formatOneDecimal(100.0 / 999), u"00.1"_qs);
+        QCOMPARE(formatOneDecimal(0.0), u"00.0"_qs);
     }
 };
 
-ZORBIN_TEST_CLASS(EncodingTest)
-#include "EncodingTest.moc"
+QTEST_GUILESS_MAIN(FileFormatTest)
+#include "FileFormatTest.moc"
