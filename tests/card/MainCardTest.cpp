@@ -336,8 +336,8 @@ private Q_SLOTS:
         auto *stop = rig.find<QPushButton>(u"cmdStop"_qs);
         auto enabled = [&] {
             QList<bool> states;
-            for (const char *name :
-                 {"cmdRunMailing", "CmdPreview", "CmdDef", "cmdStop", "PageSetupTab", "GeneralTab"})
+            for (const char *name : {"cmdRunMailing", "CmdPreview", "cmdRunPdf", "cmdRunSite", "CmdDef",
+                                     "cmdStop", "PageSetupTab", "GeneralTab"})
                 states << rig.find(QLatin1String(name))->isEnabled();
             return states;
         };
@@ -359,9 +359,9 @@ private Q_SLOTS:
             ModalAnswerer answerer;
             answerer.buttons = {QMessageBox::Yes};
             rig.find<QPushButton>(QLatin1String(button))->click();
-            QCOMPARE(enabledDuringRun, (QList<bool>{false, false, false, true, false, false}));
+            QCOMPARE(enabledDuringRun, (QList<bool>{false, false, false, false, false, true, false, false}));
             QCOMPARE(rows, 5); // the click was delivered at the first progress point
-            QCOMPARE(enabled(), (QList<bool>{true, true, true, false, true, true}));
+            QCOMPARE(enabled(), (QList<bool>{true, true, true, true, true, false, true, true}));
             QVERIFY(rig.find<QCheckBox>(u"ChkSelectAccount"_qs)->isChecked());
         }
         QCOMPARE(rig.stages->names().constLast(), u"CreateListHTML"_qs); // the runs went on

@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QSignalSpy>
 #include <QTableView>
 #include <QTemporaryDir>
 #include <QTest>
@@ -118,8 +119,12 @@ private Q_SLOTS:
         QCOMPARE(dialog.model()->rowCount(), 0);
 
         click(dialog, "cmdShowAll");
+        QSignalSpy changed(dialog.model(), &QAbstractItemModel::dataChanged);
         click(dialog, "CmdAllItems");
         QCOMPARE(storedMarks(m_path).values(), QList<bool>(6, true));
+        // A view repaints the rows that the change names: all six.
+        QCOMPARE(changed.size(), 1);
+        QCOMPARE(changed.at(0).at(1).toModelIndex().row(), 5);
         QVERIFY(dialog.findChild<QLabel *>(u"DataItems"_qs)->text().contains(QLatin1Char('6')));
     }
 
