@@ -1,8 +1,6 @@
-// The PDF writer, read back with poppler's tools (Debian's poppler-utils): the demo catalog
-// through `zorbin-cli pdf`, and small working databases for fonts, the grid, alignment,
-// right-to-left order, pictures, a stop and an empty catalog.
+// The PDF writer read back with poppler's tools: the demo through `zorbin-cli pdf`, and small working
+// databases for fonts, the grid, alignment, right-to-left order, pictures, a stop and no items.
 #include "pdf/CatalogPdf.h"
-#include "testutil/AccountingFixture.h"
 #include "testutil/OutputContext.h"
 #include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
@@ -57,8 +55,7 @@ QList<QStringList> table(const QString &tool, const QStringList &arguments)
     return rows;
 }
 
-// pdfimages -list: the kind of each picture drawn ("smask" for a transparency mask) and the
-// stored objects they draw.
+// pdfimages -list: the kind of each picture drawn ("smask": a transparency mask), the objects.
 std::pair<QStringList, QSet<int>> drawnPictures(const QString &pdf)
 {
     std::pair<QStringList, QSet<int>> drawn;
@@ -96,33 +93,31 @@ QList<Page> pdfWords(const QString &pdf)
     return pages;
 }
 
-// A text line of a grid cell: the cell's right edge and the line's words from left to right.
-struct Line
+// The right edge of a word's cell in the layout catalog (column 0 at the right).
+double cellRight(const Word &word)
 {
-    double right = 0;
-    QList<Word> words;
-};
-// The lines of the layout catalog's cells on a page (column 0 at the right), the bands' words
-// left out: words go by column, then by their vertical middle (faces differ in height).
+    return Width - Margin - int((Width - Margin - (word.xMin + word.xMax) / 2) / CellWidth) * CellWidth;
+}
+
+// A text line of a cell, its words from left to right.
+using Line = QList<Word>;
+// The lines of the layout catalog's cells on a page, the bands' words left out: words go by
+// cell, then by their vertical middle (faces differ in height).
 QList<Line> cellLines(Page words)
 {
-    const auto right = [](const Word &word) { // of the word's cell
-        return Width - Margin - int((Width - Margin - (word.xMin + word.xMax) / 2) / CellWidth) * CellWidth;
-    };
     words.removeIf([](const Word &word) { return word.middle() < Top || word.middle() > Bottom; });
-    std::sort(words.begin(), words.end(), [&](const Word &a, const Word &b) {
-        return std::pair(-right(a), a.middle()) < std::pair(-right(b), b.middle());
+    std::sort(words.begin(), words.end(), [](const Word &a, const Word &b) {
+        return std::pair(-cellRight(a), a.middle()) < std::pair(-cellRight(b), b.middle());
     });
     QList<Line> lines;
     for (const Word &word : words) {
-        if (lines.isEmpty() || lines.last().right != right(word) ||
-            word.middle() - lines.last().words.constFirst().middle() > 0.4 * (word.yMax - word.yMin))
-            lines << Line{right(word), {}};
-        lines.last().words << word;
+        if (lines.isEmpty() || cellRight(lines.last().constFirst()) != cellRight(word) ||
+            word.middle() - lines.last().constFirst().middle() > 0.4 * (word.yMax - word.yMin))
+            lines << Line();
+        lines.last() << word;
     }
     for (Line &line : lines)
-        std::sort(line.words.begin(), line.words.end(),
-                  [](const Word &a, const Word &b) { return a.xMin < b.xMin; });
+        std::sort(line.begin(), line.end(), [](const Word &a, const Word &b) { return a.xMin < b.xMin; });
     return lines;
 }
 
@@ -147,8 +142,7 @@ bool near(QRgb a, QRgb b)
     return qAbs(qRed(a) - qRed(b)) + qAbs(qGreen(a) - qGreen(b)) + qAbs(qBlue(a) - qBlue(b)) < 100;
 }
 
-// Items P000, P001, ... showing these pictures (paths in the folder of the test's pictures, or
-// "?" for none), marked for the catalog.
+// Items P000, P001, ... showing these pictures (in the test's picture folder; "?" for none).
 WorkRows itemsWithPictures(const QStringList &pictures)
 {
     WorkRows rows;
@@ -203,11 +197,9 @@ class PdfTest : public QObject
     }
 
 private Q_SLOTS:
-    // The layout catalog: eight items in Hebrew and Latin, a picture and four right-aligned
-    // lines each, in three faces.
+    // The layout catalog: eight items in Hebrew and Latin, a picture and four lines each.
     void initTestCase()
     {
-        QVERIFY(m_folder.isValid());
         WorkRows rows = itemsWithPictures(Pictures);
         for (int i = 0; i < Items; ++i) {
             WorkItem &item = rows.items[i];
@@ -228,18 +220,19 @@ private Q_SLOTS:
         QVERIFY2(written, qPrintable(written.status().description()));
         QCOMPARE(written->ending, PdfWritten::Ending::Written);
         QCOMPARE(written->file, m_layout);
+        QCOMPARE(written->pages, (Items + Rows * Columns - 1) / (Rows * Columns)); // rows x columns a page
         m_written = written.value();
         QCOMPARE(out.user.fillWidth, 0); // a run that ends puts the bar back
     }
 
-    // The demo through the command line: its first page as pdftotext lays it out, against the
-    // text beside this test (after a deliberate change ZORBIN_UPDATE_GOLDEN=1 rewrites it:
-    // review the diff), and the page sizes it offers.
+    // The demo's first page as pdftotext lays it out, against the text beside this test (after a
+    // deliberate change ZORBIN_UPDATE_GOLDEN=1 rewrites it: review the diff); the page sizes.
     void demoCatalog()
     {
         const auto cli = [](const QStringList &arguments) {
             return run(QStringLiteral(ZORBIN_CLI),
-                       QStringList{u"pdf"_s, u"--settings"_s, demoSettingsPath()} + arguments);
+                       QStringList{u"pdf"_s, u"--settings"_s, demoFolder() + u"/demo-settings.ini"_s} +
+                           arguments);
         };
         const QString pdf = m_folder.filePath(u"demo.pdf"_s), letter = m_folder.filePath(u"letter.pdf"_s);
         const auto [exitCode, out] = cli({u"--out"_s, pdf});
@@ -264,29 +257,25 @@ private Q_SLOTS:
         const QRegularExpression face(u"^(\\w+\\+)?(LiberationSans|DavidCLM|MiriamCLM|DejaVuSans)"_s);
         for (const QStringList &font : table(u"pdffonts"_s, {m_layout})) {
             // name ... emb sub uni object generation
-            QVERIFY2(font.at(font.size() - 5) == "yes"_L1, qPrintable(font.first()));
-            QVERIFY2(face.match(font.first()).hasMatch(), qPrintable(font.first()));
+            QVERIFY2(font.at(font.size() - 5) == "yes"_L1 && face.match(font.first()).hasMatch(),
+                     qPrintable(font.first()));
             families << face.match(font.first()).captured(2);
         }
         families.remove(u"DejaVuSans"_s);
         QCOMPARE(families.size(), 3);
     }
 
-    void pagesHoldRowsTimesColumns()
-    {
-        QCOMPARE(m_written.pages, (Items + Rows * Columns - 1) / (Rows * Columns));
-        QCOMPARE(pdfWords(m_layout).size(), m_written.pages);
-    }
-
     // Every line here is right-aligned: its last word ends within 1 mm of its cell's right edge.
     void rightAlignedLinesEndAtTheCellEdge()
     {
+        const QList<Page> pages = pdfWords(m_layout);
+        QCOMPARE(pages.size(), m_written.pages);
         int lines = 0;
-        for (const Page &page : pdfWords(m_layout)) {
+        for (const Page &page : pages) {
             for (const Line &line : cellLines(page)) {
-                const double gap = line.right - line.words.constLast().xMax;
+                const double gap = cellRight(line.constLast()) - line.constLast().xMax;
                 QVERIFY2(gap >= 0 && gap <= Millimetre,
-                         qPrintable(u"%1 ends %2 mm from its cell's edge"_s.arg(line.words.constLast().text)
+                         qPrintable(u"%1 ends %2 mm from its cell's edge"_s.arg(line.constLast().text)
                                         .arg(gap / Millimetre)));
                 ++lines;
             }
@@ -313,7 +302,7 @@ private Q_SLOTS:
         QStringList seen;
         for (const Line &line : cellLines(pdfWords(m_layout).constFirst())) {
             seen << QString();
-            for (const Word &word : line.words)
+            for (const Word &word : line)
                 seen.last() += word.text;
         }
         QVERIFY2(seen.contains(expected),

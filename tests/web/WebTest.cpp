@@ -1,6 +1,5 @@
-// The web catalog: thumbnails and their cache across runs, the item spool, and whole runs of the
-// site writer on a small working database (the order of items and sections, what the pages
-// hold and refer to, and what a stop, a failure or an empty catalog leaves).
+// The web catalog: thumbnails and their cache, the item spool, and whole runs of the site writer on
+// a small working database: what the pages hold and refer to, what a stop, a failure, no items leave.
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/OutputContext.h"
 #include "testutil/TestFiles.h"
@@ -29,11 +28,10 @@ const QSize Box(120, 90);
 
 QByteArray encoded(const QImage &image, const char *format)
 {
-    QByteArray bytes;
-    QBuffer buffer(&bytes);
+    QBuffer buffer;
     buffer.open(QIODevice::WriteOnly);
     image.save(&buffer, format);
-    return bytes;
+    return buffer.data();
 }
 
 // Left half red, right half blue, so that a turn shows where the halves went.
@@ -227,9 +225,8 @@ private Q_SLOTS:
         QVERIFY(!spool.value()->next(2));
     }
 
-    // The items by page, under sections in sort-code order with the items without a group
-    // last, or in the catalog's order; the values escaped; the search index; every address
-    // in the pages a file of the site, relative to it.
+    // The items by page under sections in sort-code order, those without a group last, or in catalog
+    // order; values escaped; the search index; every address in the pages a file of the site.
     void orderAndContent_data()
     {
         QTest::addColumn<bool>("sections");
