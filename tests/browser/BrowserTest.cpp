@@ -149,9 +149,7 @@ private Q_SLOTS:
         QCOMPARE(fileOf(first[u"next"_s]), secondPage);
         QVERIFY(first[u"previous"_s].isNull());
         QCOMPARE(fileOf(second[u"location"_s]), secondPage); // where the click led
-        QCOMPARE(second[u"cells"_s].toInt(), cells);
         QCOMPARE(fileOf(second[u"previous"_s]), m_catalog);
-        QVERIFY(shownPictures(second) >= 0);
     }
 
     // The demo's web catalog on a phone and on a wide screen.

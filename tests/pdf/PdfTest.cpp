@@ -9,7 +9,6 @@
 #include <QDir>
 #include <QGuiApplication>
 #include <QImage>
-#include <QMap>
 #include <QProcess>
 #include <QRegularExpression>
 #include <QSet>
@@ -155,10 +154,8 @@ WorkRows itemsWithPictures(const QStringList &pictures)
 }
 
 // Three items show the photograph.
-const QStringList Pictures{u"photo-exif.jpg"_s,  u"photo-exif.jpg"_s,
-                           u"transparent.png"_s, u"broken.jpg"_s,
-                           u"missing.jpg"_s,     u"?"_s,
-                           u"photo-exif.jpg"_s,  u"?"_s};
+const QStringList Pictures =
+    u"photo-exif.jpg photo-exif.jpg transparent.png broken.jpg missing.jpg ? photo-exif.jpg ?"_s.split(u' ');
 
 } // namespace
 
@@ -220,7 +217,7 @@ private Q_SLOTS:
         QVERIFY2(written, qPrintable(written.status().description()));
         QCOMPARE(written->ending, PdfWritten::Ending::Written);
         QCOMPARE(written->file, m_layout);
-        QCOMPARE(written->pages, (Items + Rows * Columns - 1) / (Rows * Columns)); // rows x columns a page
+        QCOMPARE(written->pages, 2); // eight items, six cells a page
         m_written = written.value();
         QCOMPARE(out.user.fillWidth, 0); // a run that ends puts the bar back
     }
