@@ -197,6 +197,10 @@ private Q_SLOTS:
     // The layout catalog: eight items in Hebrew and Latin, a picture and four lines each.
     void initTestCase()
     {
+        if (qEnvironmentVariableIsSet("ZORBIN_KEEP_TEST_FILES")) { // for a look at the PDFs
+            m_folder.setAutoRemove(false);
+            qInfo("keeping %s", qPrintable(m_folder.path()));
+        }
         WorkRows rows = itemsWithPictures(Pictures);
         for (int i = 0; i < Items; ++i) {
             WorkItem &item = rows.items[i];
@@ -223,7 +227,7 @@ private Q_SLOTS:
     }
 
     // The demo's first page as pdftotext lays it out, against the text beside this test (after a
-    // deliberate change ZORBIN_UPDATE_GOLDEN=1 rewrites it: review the diff); the page sizes.
+    // deliberate change ZORBIN_UPDATE_GOLDEN=1 rewrites it: review the diff); its pictures; the page sizes.
     void demoCatalog()
     {
         const auto cli = [](const QStringList &arguments) {
@@ -241,6 +245,7 @@ private Q_SLOTS:
             writeFile(expected, text);
         QCOMPARE(QString::fromUtf8(text), QString::fromUtf8(readFile(expected)));
 
+        QCOMPARE(drawnPictures(pdf).second.size(), 13); // the twelve pictures and the logo, each stored once
         QVERIFY(run(u"pdfinfo"_s, {pdf}).second.contains("595 x 842 pts (A4)"));
         QCOMPARE(cli({u"--out"_s, letter, u"--page-size"_s, u"letter"_s}).first, 0);
         QVERIFY(run(u"pdfinfo"_s, {letter}).second.contains("612 x 792 pts (letter)"));
