@@ -17,7 +17,6 @@
 #include <QXmlStreamReader>
 #include <algorithm>
 #include <unicode/ubidi.h>
-#include <vector>
 
 using namespace zorbin;
 using namespace zorbin::test;
@@ -128,12 +127,12 @@ QString visualOrder(const QString &logical)
     UBiDi *bidi = ubidi_open();
     ubidi_setPara(bidi, reinterpret_cast<const UChar *>(logical.utf16()), int32_t(logical.size()), UBIDI_RTL,
                   nullptr, &error);
-    std::vector<UChar> visual(std::size_t(logical.size()) * 2 + 1);
-    const int32_t length = ubidi_writeReordered(bidi, visual.data(), int32_t(visual.size()),
-                                                UBIDI_DO_MIRRORING | UBIDI_REMOVE_BIDI_CONTROLS, &error);
+    QString visual(logical.size() * 2, QChar());
+    const int32_t length =
+        ubidi_writeReordered(bidi, reinterpret_cast<UChar *>(visual.data()), int32_t(visual.size()),
+                             UBIDI_DO_MIRRORING | UBIDI_REMOVE_BIDI_CONTROLS, &error);
     ubidi_close(bidi);
-    return U_SUCCESS(error) ? QString::fromUtf16(reinterpret_cast<const char16_t *>(visual.data()), length)
-                            : QString();
+    return U_SUCCESS(error) ? visual.left(length) : QString();
 }
 
 bool near(QRgb a, QRgb b)

@@ -211,12 +211,9 @@ private Q_SLOTS:
             QVERIFY(spool.value()->append(stream, streams[stream].last()));
         }
         QVERIFY(spool.value()->finish());
-        for (qsizetype n = 0; n < std::max(streams[0].size(), streams[1].size()); ++n) {
-            for (std::size_t stream : {0, 1}) {
-                if (n < streams[stream].size())
-                    QCOMPARE(spool.value()->next(stream).value().toByteArray(), streams[stream][n]);
-            }
-        }
+        QCOMPARE(streams[0].size(), streams[1].size());
+        for (qsizetype n = 0; n < streams[0].size() * 2; ++n)
+            QCOMPARE(spool.value()->next(std::size_t(n % 2)).value().toByteArray(), streams[n % 2][n / 2]);
         for (const QByteArray &expected : streams[2])
             QCOMPARE(spool.value()->next(2).value().toByteArray(), expected);
         QVERIFY(!spool.value()->next(2));
@@ -299,8 +296,7 @@ private Q_SLOTS:
             QCOMPARE(result.value(), site() + u"/index.html"_s);
         else
             QVERIFY(result.status().description().contains(u"page-2.html"_s));
-        QCOMPARE(contents(site()).keys(), before.keys());
-        QVERIFY(contents(site()) == before);
+        QCOMPARE(contents(site()), before);
     }
 
     // No items: the earlier site's pages go, the shop's own files and the cache record stay.
