@@ -216,12 +216,8 @@ private Q_SLOTS:
         test::OutputContext run;
         run.settings.rows = 1;
         run.settings.columns = 3;
-        run.settings.pictureWidth = run.settings.pictureHeight = 50;
         run.settings.lines[0].field = 0;
         run.settings.lines[1].field = 2;
-        run.settings.pageSplit = PageSplit::OneFile;
-        run.settings.sortKey = SortKey::ItemKey;
-        run.settings.sortDirection = SortDirection::Ascending;
         const auto first = CreateCatHTML(run.context, out + u"zo"_s, db, out + u"images"_s);
         QVERIFY2(first, qPrintable(first.status().description()));
 

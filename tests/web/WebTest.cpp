@@ -61,8 +61,6 @@ struct SiteRun : test::OutputContext
         for (std::size_t line = 0; const int field : {0, 2, 1, 4})
             settings.lines[line++].field = field;
         settings.priceList1.setCurrentIndex(settings.priceList1.addEntry(u"מחיר"_s, 0));
-        settings.sortKey = SortKey::ItemKey;
-        settings.sortDirection = SortDirection::Ascending;
     }
 };
 
