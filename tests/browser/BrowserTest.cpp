@@ -192,6 +192,9 @@ private Q_SLOTS:
         QVERIFY(last[u"location"_s].toString().endsWith(links.last()[u"href"_s].toString()));
         QCOMPARE(last[u"heading"_s].toString(), links.last()[u"text"_s].toString());
         QCOMPARE(findings[u"console"_s].toArray(), QJsonArray());
+        // Every rule of the stylesheet (each closes with a brace) was one the browser could read.
+        const QString style = QString::fromUtf8(test::readFile(m_work.filePath(u"site/site.css"_s)));
+        QCOMPARE(findings[u"styleRules"_s].toInt(), int(style.count(u'}')));
     }
 
     // Pictures in a folder and under names with quotes, '#', '%', '&' and Hebrew all show.
