@@ -123,15 +123,12 @@ private Q_SLOTS:
     void buildsTheStringOfEachType()
     {
         const Built &c = fetchCase(Builds);
-        QString server = text(c.server);
-        QString expected = text(c.expected);
-        if (c.type == 3) {
-            server.replace(u'/', pathSeparator());
-            expected.replace(u'/', pathSeparator());
-        }
-        QCOMPARE(BuildConnString(server, text(c.user), text(c.password), text(c.database),
-                                 static_cast<ConnectionKind>(c.type)),
-                 expected);
+        const auto native = [&c](const char *path) {
+            return c.type == 3 ? text(path).replace(u'/', pathSeparator()) : text(path);
+        };
+        QCOMPARE(BuildConnString(native(c.server), text(c.user), text(c.password), text(c.database),
+                                 ConnectionKind(c.type)),
+                 native(c.expected));
     }
 
     void readsAValue_data() { addCaseRows(Reads); }
