@@ -120,16 +120,14 @@ QString jetFile(const QString &name)
 QString rowsOf(SourceConnection &source, const QString &sql)
 {
     auto query = source.select(sql);
-    if (!query)
-        return u"refused: "_s + query.status().description();
     QStringList rows;
-    while (query->next()) {
+    while (query && query->next()) {
         QStringList row;
         for (int i = 0; i < query->record().count(); ++i)
             row << (query->value(i).isNull() ? u"<null>"_s : query->value(i).toString());
         rows << row.join(u'|');
     }
-    return rows.join(u" / "_s);
+    return query ? rows.join(u" / "_s) : u"refused: "_s + query.status().description();
 }
 
 std::unique_ptr<SourceConnection> open(const QString &connection)

@@ -189,9 +189,9 @@ private Q_SLOTS:
                               u"סורק מחירון ראשי"_s, u"סורק מחירון משני"_s, u"סורק נתון נוסף 1"_s,
                               u"סורק נתון נוסף 2"_s, u"סריקת הנתונים הסתיימה"_s}));
         QStringList tables;
-        for (const char *table :
-             {"tItems", "tItemPrice1", "tItemPrice2", "tExtraNote1", "tExtraNote2", "tItemSort"})
-            tables << QLatin1String(table) << rows(QLatin1String(table));
+        for (const QString &table :
+             u"tItems tItemPrice1 tItemPrice2 tExtraNote1 tExtraNote2 tItemSort"_s.split(u' '))
+            tables << table << rows(table);
         QStringList expected = testData("small-collected.txt").split(u'\n', Qt::SkipEmptyParts);
         expected.removeIf([](const QString &line) { return line.startsWith(u'#'); });
         QCOMPARE(tables, expected);

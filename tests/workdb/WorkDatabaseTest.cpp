@@ -83,12 +83,10 @@ class WorkDatabaseTest : public QObject
     QString column(const QString &sql)
     {
         Result<QSqlQuery> query = m_work->select(sql);
-        if (!query)
-            return u"error: "_s + query.status().description();
         QStringList values;
-        while (query->next())
+        while (query && query->next())
             values << query->value(0).toString();
-        return values.join(u' ');
+        return query ? values.join(u' ') : u"error: "_s + query.status().description();
     }
     WriteOutcome insert(const QString &table, const QString &key)
     {
