@@ -8,9 +8,8 @@
 #include <QApplication>
 #include <cstring>
 
-ZORBIN_DECLARE_TEST(ConnectionStringTest)
+ZORBIN_DECLARE_TEST(ConnectionSettingsTest)
 ZORBIN_DECLARE_TEST(CriteriaTest)
-ZORBIN_DECLARE_TEST(SettingsFileTest)
 std::unique_ptr<QObject> makeSourceConnectionTest(const QByteArray &group);
 
 int main(int argc, char *argv[])
@@ -25,8 +24,8 @@ int main(int argc, char *argv[])
         qFatal("unknown test group %s", group.constData());
     std::vector<std::unique_ptr<QObject>> tests;
     if (group == "main") {
-        for (auto make : {makeConnectionStringTest, makeCriteriaTest, makeSettingsFileTest})
-            tests.push_back(make());
+        tests.push_back(makeConnectionSettingsTest());
+        tests.push_back(makeCriteriaTest());
     }
     tests.push_back(makeSourceConnectionTest(group));
     return zorbin::test::runTestObjects(argc, argv, tests);

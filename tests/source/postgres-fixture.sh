@@ -90,6 +90,11 @@ start) ;;
 esac
 
 demo=${3:?the demo database}
+# sqlite3 would create an empty file in its place, which the build then takes for the demo.
+if [ ! -s "$demo" ]; then
+    echo "postgres-fixture.sh: no demo database at $demo (build the target zorbin-demo)" >&2
+    exit 1
+fi
 schema=${4:?the schema file}
 superuser_password=fixture-super
 reader=catalog

@@ -3,7 +3,6 @@
 #include "platform/FileSystem.h"
 
 #include <QSet>
-#include <QStringList>
 
 namespace zorbin::test {
 
@@ -17,12 +16,10 @@ public:
     std::optional<QString> findFile(const QString &path) const override { return real().findFile(path); }
     Status makeFolder(const QString &path) override
     {
-        made << path;
         return fails(path) ? failure(path) : real().makeFolder(path);
     }
     Status removeFile(const QString &path) override
     {
-        removed << path;
         return fails(path) ? failure(path) : real().removeFile(path);
     }
     Status copyFile(const QString &from, const QString &to) override
@@ -36,20 +33,14 @@ public:
     }
     Result<std::unique_ptr<QIODevice>> openForWriting(const QString &path) override
     {
-        if (fails(path))
-            return failure(path);
-        return real().openForWriting(path);
+        return fails(path) ? failure(path) : real().openForWriting(path);
     }
     Result<std::unique_ptr<QIODevice>> openForAppending(const QString &path) override
     {
-        if (fails(path))
-            return failure(path);
-        return real().openForAppending(path);
+        return fails(path) ? failure(path) : real().openForAppending(path);
     }
 
     QSet<QString> failingPaths;
-    QStringList made;
-    QStringList removed;
 
 private:
     static FileSystem &real() { return localFileSystem(); }

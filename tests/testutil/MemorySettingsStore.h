@@ -26,29 +26,9 @@ public:
     }
 
     // Shortcuts for the store's one location, "Zorbin"/"Params".
-    void set(const QString &key, const QString &value)
-    {
-        values.insert(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key), value);
-    }
-    QString get(const QString &key) const
-    {
-        return values.value(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key));
-    }
-    bool has(const QString &key) const
-    {
-        return values.contains(path(QStringLiteral("Zorbin"), QStringLiteral("Params"), key));
-    }
-    // The keys under "Zorbin"/"Params", without the prefix.
-    QStringList keys() const
-    {
-        QStringList result;
-        const QString prefix = QStringLiteral("Zorbin/Params/");
-        for (auto it = values.cbegin(); it != values.cend(); ++it) {
-            if (it.key().startsWith(prefix))
-                result << it.key().mid(prefix.size());
-        }
-        return result;
-    }
+    void set(const QString &key, const QString &value) { values.insert(params(key), value); }
+    QString get(const QString &key) const { return values.value(params(key)); }
+    bool has(const QString &key) const { return values.contains(params(key)); }
 
     QMap<QString, QString> values;
     int writes = 0;
@@ -58,6 +38,7 @@ private:
     {
         return app + QLatin1Char('/') + section + QLatin1Char('/') + key;
     }
+    static QString params(const QString &key) { return QStringLiteral("Zorbin/Params/") + key; }
 };
 
 } // namespace zorbin::test

@@ -20,10 +20,9 @@ public:
         MessageIcon icon;
     };
 
-    Answer ask(const QString &text, const QString &title, QuestionButtons buttons) override
+    Answer ask(const QString &text, const QString &, QuestionButtons buttons) override
     {
         questions << text;
-        questionTitles << title;
         questionButtons << buttons;
         return answers.isEmpty() ? Answer::Yes : answers.takeFirst();
     }
@@ -34,11 +33,7 @@ public:
     void showStatus(const QString &text) override { statuses << text; }
     int progressFrameWidth() const override { return frameWidth; }
     int progressFillWidth() const override { return fillWidth; }
-    void setProgressFillWidth(int width) override
-    {
-        fillWidth = width;
-        widths << width;
-    }
+    void setProgressFillWidth(int width) override { widths << (fillWidth = width); }
     void yield() override
     {
         ++yields;
@@ -54,7 +49,6 @@ public:
 
     QList<Answer> answers;
     QStringList questions;
-    QStringList questionTitles;
     QList<QuestionButtons> questionButtons;
     QList<Message> messages;
     QStringList statuses;

@@ -3,8 +3,6 @@
 #include "common/Status.h"
 #include "model/ConnectionParams.h"
 
-#include <QString>
-
 namespace zorbin::test {
 
 // Registers the SQLite3 ODBC driver (libsqliteodbc) under the driver name "SQL Server" in a

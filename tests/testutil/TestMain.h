@@ -3,6 +3,7 @@
 #include "workdb/SqliteEngine.h"
 
 #include <QObject>
+#include <QTest>
 #include <memory>
 #include <vector>
 
@@ -16,7 +17,13 @@
 namespace zorbin::test {
 
 // Runs each test object with the command-line arguments; the number of classes that failed.
-int runTestObjects(int argc, char *argv[], const std::vector<std::unique_ptr<QObject>> &tests);
+inline int runTestObjects(int argc, char *argv[], const std::vector<std::unique_ptr<QObject>> &tests)
+{
+    int failed = 0;
+    for (const auto &test : tests)
+        failed += QTest::qExec(test.get(), argc, argv) != 0 ? 1 : 0;
+    return failed;
+}
 
 } // namespace zorbin::test
 

@@ -3,55 +3,35 @@
 #include "platform/FileSystem.h"
 #include "workdb/RowWriter.h"
 #include "workdb/WorkDatabase.h"
-#include "workdb/WorkSchema.h"
 
-#include <QSqlQuery>
 #include <QSqlRecord>
 
 namespace zorbin::test {
-namespace {
-
-Status writeRows(WorkDatabase &work, const QString &table, const QList<QVariantList> &rows)
-{
-    const WorkTable *definition = findWorkTable(table);
-    if (!definition)
-        return Status::fault(QStringLiteral("no working table %1").arg(table));
-    RowWriter writer(work, table, definition->columnNames());
-    for (const QVariantList &row : rows) {
-        if (row.size() != static_cast<qsizetype>(definition->columns.size()))
-            return Status::fault(
-                QStringLiteral("a row of %1 needs %2 values").arg(table).arg(definition->columns.size()));
-        if (WriteOutcome written = writer.write(row); !written)
-            return Status::fault(QStringLiteral("%1: %2").arg(table, written.description()));
-    }
-    return Status::ok();
-}
-
-} // namespace
-
-QVariantList WorkItem::values() const
-{
-    return {key, name, sort, filter, unit, price, coin, picture, include ? WorkTrue : WorkFalse};
-}
 
 Status makeWorkDatabase(const QString &path, const WorkRows &rows)
 {
     if (Status created = createWorkDatabase(localFileSystem(), path); !created)
         return created;
-    Result<std::unique_ptr<WorkDatabase>> work = WorkDatabase::open(path);
-    if (!work)
-        return work.status();
+    auto work = WorkDatabase::open(path);
     // One transaction: a row at a time, tens of thousands of items would take minutes.
-    if (Status begun = work.value()->begin(); !begun)
+    if (Status begun = work ? work.value()->begin() : work.status(); !begun)
         return begun;
-    QList<QVariantList> items;
+    QMap<QString, QList<QVariantList>> tables = rows.other;
     for (const WorkItem &item : rows.items)
-        items << item.values();
-    if (Status written = writeRows(*work.value(), QStringLiteral("tItems"), items); !written)
-        return written;
-    for (auto it = rows.other.cbegin(); it != rows.other.cend(); ++it) {
-        if (Status written = writeRows(*work.value(), it.key(), it.value()); !written)
-            return written;
+        tables[QStringLiteral("tItems")] << item.values();
+    for (auto table = tables.cbegin(); table != tables.cend(); ++table) {
+        const WorkTable *definition = findWorkTable(table.key());
+        if (!definition)
+            return Status::fault(QStringLiteral("no working table %1").arg(table.key()));
+        RowWriter writer(*work.value(), table.key(), definition->columnNames());
+        for (const QVariantList &row : table.value()) {
+            if (row.size() != qsizetype(definition->columns.size()))
+                return Status::fault(QStringLiteral("a row of %1 needs %2 values")
+                                         .arg(table.key())
+                                         .arg(definition->columns.size()));
+            if (WriteOutcome written = writer.write(row); !written)
+                return Status::fault(table.key() + QStringLiteral(": ") + written.description());
+        }
     }
     return work.value()->commit();
 }
@@ -60,21 +40,16 @@ QList<QVariantList> readWorkTable(const QString &path, const QString &table)
 {
     QList<QVariantList> rows;
     const WorkTable *definition = findWorkTable(table);
-    Result<std::unique_ptr<WorkDatabase>> work = WorkDatabase::open(path);
+    auto work = WorkDatabase::open(path);
     if (!definition || !work)
         return rows;
-    {
-        Result<QSqlQuery> query = work.value()->select(
-            QStringLiteral("SELECT %1 FROM %2 ORDER BY %3")
-                .arg(definition->columnNames().join(QStringLiteral(", ")), table, definition->key().name));
-        if (!query)
-            return rows;
-        while (query->next()) {
-            QVariantList row;
-            for (int i = 0; i < query->record().count(); ++i)
-                row << query->value(i);
-            rows << row;
-        }
+    Result<QSqlQuery> query = work.value()->select(
+        QStringLiteral("SELECT %1 FROM %2 ORDER BY %3")
+            .arg(definition->columnNames().join(QStringLiteral(", ")), table, definition->key().name));
+    while (query && query->next()) {
+        rows << QVariantList();
+        for (int i = 0; i < query->record().count(); ++i)
+            rows.last() << query->value(i);
     }
     return rows;
 }

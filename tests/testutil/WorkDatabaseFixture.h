@@ -1,10 +1,9 @@
 #pragma once
 
 #include "common/Status.h"
+#include "workdb/WorkSchema.h"
 
 #include <QMap>
-#include <QString>
-#include <QVariant>
 #include <QVariantList>
 
 namespace zorbin::test {
@@ -27,7 +26,10 @@ struct WorkItem
     bool include = true;
 
     // The values in the column order of tItems.
-    QVariantList values() const;
+    QVariantList values() const
+    {
+        return {key, name, sort, filter, unit, price, coin, picture, include ? WorkTrue : WorkFalse};
+    }
 };
 
 // What goes into a working database: per table, rows of values in the table's column order

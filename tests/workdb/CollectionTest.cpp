@@ -18,7 +18,6 @@
 #include "workdb/WorkDatabasePath.h"
 
 #include <QTemporaryDir>
-#include <QTest>
 
 using namespace zorbin;
 using namespace zorbin::test;
@@ -99,11 +98,9 @@ private:
     }
     QString makeSource(const QString &name, const QStringList &statements)
     {
-        const QString path = m_temp.filePath(name);
-        const Status made = makeAccountingFile(path, statements);
-        if (!made)
+        if (const Status made = makeAccountingFile(m_temp.filePath(name), statements); !made)
             qWarning("%s", qPrintable(made.description()));
-        return path;
+        return m_temp.filePath(name);
     }
     void collectPrice(int digit, int list)
     {
@@ -122,9 +119,7 @@ private:
     Status failedStep()
     {
         const Result<CollectionReport> report = collect();
-        if (!report)
-            return Status::fault(u"escaped: "_s + report.status().description());
-        return report->stepFailure;
+        return report ? report->stepFailure : Status::fault(u"escaped: "_s + report.status().description());
     }
     // The rows of a working table, "|" between values, a Null as "<null>".
     QStringList rows(const QString &table) const
@@ -141,10 +136,10 @@ private:
     // One column of a working table (the key by default), its values separated by blanks.
     QString keys(const QString &table, int column = 0) const
     {
-        QStringList found;
-        for (const QString &row : rows(table))
-            found << row.section(QLatin1Char('|'), column, column);
-        return found.join(QLatin1Char(' '));
+        QStringList found = rows(table);
+        for (QString &row : found)
+            row = row.section(u'|', column, column);
+        return found.join(u' ');
     }
 
 private Q_SLOTS:
@@ -194,9 +189,9 @@ private Q_SLOTS:
                               u"סורק מחירון ראשי"_s, u"סורק מחירון משני"_s, u"סורק נתון נוסף 1"_s,
                               u"סורק נתון נוסף 2"_s, u"סריקת הנתונים הסתיימה"_s}));
         QStringList tables;
-        for (const char *table :
-             {"tItems", "tItemPrice1", "tItemPrice2", "tExtraNote1", "tExtraNote2", "tItemSort"})
-            tables << QLatin1String(table) << rows(QLatin1String(table));
+        for (const QString &table :
+             u"tItems tItemPrice1 tItemPrice2 tExtraNote1 tExtraNote2 tItemSort"_s.split(u' '))
+            tables << table << rows(table);
         QStringList expected = testData("small-collected.txt").split(u'\n', Qt::SkipEmptyParts);
         expected.removeIf([](const QString &line) { return line.startsWith(u'#'); });
         QCOMPARE(tables, expected);

@@ -2,12 +2,10 @@
 
 #include <QCoreApplication>
 
-ZORBIN_DECLARE_TEST(BooleanLiteralsTest)
 ZORBIN_DECLARE_TEST(WorkDatabaseTest)
 ZORBIN_DECLARE_TEST(CollectionTest)
 
 ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
-ZORBIN_TEST_ADD(BooleanLiteralsTest)
 ZORBIN_TEST_ADD(WorkDatabaseTest)
 ZORBIN_TEST_ADD(CollectionTest)
 ZORBIN_TEST_MAIN_END

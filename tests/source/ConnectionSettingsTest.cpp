@@ -1,11 +1,16 @@
-#include "source/ConnectionString.h"
-
 #include "platform/Paths.h"
+#include "platform/SettingsStore.h"
 #include "source/ConnectionStore.h"
+#include "source/ConnectionString.h"
 #include "testutil/CaseTable.h"
 #include "testutil/EdgeOfMemory.h"
 #include "testutil/MemorySettingsStore.h"
+#include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
+
+#include <QFileInfo>
+#include <QSettings>
+#include <QTemporaryDir>
 
 using namespace zorbin;
 using namespace zorbin::test;
@@ -111,10 +116,11 @@ QString text(const char *utf8)
 
 } // namespace
 
-// Connection strings are built from what the user typed and read back by the connection, the
-// printed masks and the OLE DB conversion. The texts parsed here touch unreadable memory at both
-// ends, so that a read past an end fails the test.
-class ConnectionStringTest : public QObject
+// The stored connection: its strings, built from what the user typed and read back by the
+// connection, the printed masks and the OLE DB conversion; its stored type; the settings file that
+// holds its password. The texts parsed here touch unreadable memory at both ends, so that a read
+// past an end fails the test.
+class ConnectionSettingsTest : public QObject
 {
     Q_OBJECT
 
@@ -123,15 +129,12 @@ private Q_SLOTS:
     void buildsTheStringOfEachType()
     {
         const Built &c = fetchCase(Builds);
-        QString server = text(c.server);
-        QString expected = text(c.expected);
-        if (c.type == 3) {
-            server.replace(u'/', pathSeparator());
-            expected.replace(u'/', pathSeparator());
-        }
-        QCOMPARE(BuildConnString(server, text(c.user), text(c.password), text(c.database),
-                                 static_cast<ConnectionKind>(c.type)),
-                 expected);
+        const auto native = [&c](const char *path) {
+            return c.type == 3 ? text(path).replace(u'/', pathSeparator()) : text(path);
+        };
+        QCOMPARE(BuildConnString(native(c.server), text(c.user), text(c.password), text(c.database),
+                                 ConnectionKind(c.type)),
+                 native(c.expected));
     }
 
     void readsAValue_data() { addCaseRows(Reads); }
@@ -181,7 +184,52 @@ private Q_SLOTS:
         GetRegConnParams(store, params);
         QCOMPARE(int(params.kind), c.type);
     }
+
+    // The settings hold the connection password in plain text (earlier versions read it so), so a
+    // settings file that is written is its owner's only; one that is only read (the demo's installed
+    // settings, a file given to zorbin-cli) keeps its permissions.
+    void aWrittenFileIsTheOwnersOnly_data()
+    {
+        QTest::addColumn<QString>("file"); // empty: the user's own settings, made anew
+        QTest::addColumn<bool>("written");
+        QTest::newRow("the user's new settings") << QString() << true;
+        QTest::newRow("a file others could read, written") << u"settings.ini"_s << true;
+        QTest::newRow("a file others can read, only read") << u"settings.ini"_s << false;
+    }
+    void aWrittenFileIsTheOwnersOnly()
+    {
+#ifdef Q_OS_WIN
+        QSKIP("The registry keeps the settings on Windows.");
+#endif
+        QFETCH(QString, file);
+        QFETCH(bool, written);
+        QTemporaryDir folder;
+        // ctest points XDG_CONFIG_HOME into the build tree, so that no real settings are touched.
+        QVERIFY2(qEnvironmentVariableIsSet("XDG_CONFIG_HOME"), "run through ctest");
+        const QString path = file.isEmpty() ? QSettings(QSettings::NativeFormat, QSettings::UserScope,
+                                                        u"Zorbin"_s, u"Zorbin"_s)
+                                                  .fileName()
+                                            : folder.filePath(file);
+        const auto readable = QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ReadGroup |
+                              QFileDevice::ReadOther;
+        QFile::remove(path);
+        if (!file.isEmpty()) {
+            writeFile(path, "[Params]\nConnPWD=old\n");
+            QVERIFY(QFile::setPermissions(path, readable));
+        }
+        {
+            auto store = file.isEmpty() ? openUserSettingsStore() : openIniSettingsStore(path);
+            QCOMPARE(store->read(u"Zorbin"_s, u"Params"_s, u"ConnPWD"_s, {}),
+                     file.isEmpty() ? QString() : u"old"_s);
+            if (written)
+                store->write(u"Zorbin"_s, u"Params"_s, u"ConnPWD"_s, u"secret"_s);
+            store->flush();
+        }
+        const auto everyone = QFileDevice::Permissions::fromInt(0x7077); // owner, group, others
+        QCOMPARE(QFileInfo(path).permissions() & everyone,
+                 written ? QFileDevice::ReadOwner | QFileDevice::WriteOwner : readable);
+    }
 };
 
-ZORBIN_TEST_CLASS(ConnectionStringTest)
-#include "ConnectionStringTest.moc"
+ZORBIN_TEST_CLASS(ConnectionSettingsTest)
+#include "ConnectionSettingsTest.moc"
