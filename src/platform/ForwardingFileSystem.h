@@ -11,6 +11,10 @@ class ForwardingFileSystem : public FileSystem
 {
 public:
     explicit ForwardingFileSystem(FileSystem &inner = localFileSystem()) : m_inner(inner) {}
+    // Not copyable: a copy would be chosen over wrapping when the inner file system is itself
+    // a ForwardingFileSystem, and would forward to what the original wraps.
+    ForwardingFileSystem(const ForwardingFileSystem &) = delete;
+    ForwardingFileSystem &operator=(const ForwardingFileSystem &) = delete;
 
     bool fileExists(const QString &path) const override { return m_inner.fileExists(path); }
     bool folderExists(const QString &path) const override { return m_inner.folderExists(path); }
