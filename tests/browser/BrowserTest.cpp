@@ -178,6 +178,7 @@ private Q_SLOTS:
         QVERIFY(images.size() > 1);
         for (const QJsonValue image : images)
             QVERIFY2(image[u"naturalWidth"_s].toInt() > 0, qPrintable(image[u"src"_s].toString()));
+        QVERIFY(findings[u"searchShown"_s].toBool());
         const QJsonArray found = findings[u"found"_s].toArray();
         QCOMPARE(found.size(), 1);
         QVERIFY(found.at(0).toString().contains(key));

@@ -258,6 +258,10 @@ private Q_SLOTS:
         rig.control->requestStop();
         QCOMPARE(rig.control->makeList(true).ending, Ending::Complete);
         QCOMPARE(rig.stages->stopSeen.mid(8), (QList<bool>{false, false}));
+        rig.control
+            ->requestStop(); // a stop left over from before does not cut the item selection's collection
+        QCOMPARE(rig.control->collectItems().ending, Ending::Complete);
+        QCOMPARE(rig.stages->stopSeen.constLast(), false);
     }
 
     // While a run yields, the buttons can be pressed: a second run or a save is refused.

@@ -5,6 +5,7 @@
 #include "platform/ValueFormat.h"
 #include "platform/Windows1255Encoder.h"
 #include "platform/Windows1255Writer.h"
+#include "testutil/EdgeOfMemory.h"
 #include "testutil/TestFiles.h"
 
 #include <QLocale>
@@ -126,10 +127,12 @@ private Q_SLOTS:
         // A lone first half of a pair ends before the reference of the markup after it.
         writer.writeEscaped(QString(QChar(0xD83D)) + u"<"_qs);
         writer.writeEscaped(QString(QChar(0xD83D)));
+        for (const QString &edge : test::atEdgesOfMemory(u"a>"_qs)) // no read past either end
+            writer.writeEscaped(edge);
         writer.writeLine(u"</td>");
         QByteArray expected(
             "<td>\xF9&quot;\xE7\xA4\xFD &lt;b&gt;&amp;&#39;x&#39;&#128512;&amp;&#33457;&#55357;&lt;"
-            "&#55357;</td>\r\n");
+            "&#55357;a&gt;a&gt;</td>\r\n");
         for (int i = 0; i < 20000; ++i) {
             writer.write(u"<p>");
             writer.writeLine(u"\u05D0\U0001F600%1"_qs.arg(i));

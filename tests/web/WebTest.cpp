@@ -251,6 +251,7 @@ private Q_SLOTS:
         QCOMPARE(files.value(u"index.html"_s).contains("<li><a href=\"page-2.html#s-2\">קבוצת מיון 2</a>"),
                  sections);
         QCOMPARE(files.value(u"page-3.html"_s).contains("id=\"s-none\""), sections);
+        QVERIFY(files.value(u"page-3.html"_s).contains("<a href=\"page-2.html\" rel=\"prev\">"));
         QVERIFY(all.contains("<bdi>כיסא &lt;b&gt;&amp;&quot;&#39;</bdi>") && !all.contains("<b>&"));
         QVERIFY(all.contains("Lamp 😀 灯") && all.contains("<bdi>1,234.50</bdi> ש&quot;ח"));
         QCOMPARE(files.value(u"search-index.js"_s).count("[\"K"), 5);
