@@ -206,6 +206,16 @@ int demo(const QStringList &arguments)
     return runOutput(*store, request);
 }
 
+// The PDF and the web catalog: to the file or folder of --out when given, else to their place in
+// the output folder.
+int runToChosenFile(const QCommandLineParser &parser, RunRequest request)
+{
+    if (parser.isSet(OutOption))
+        request.file = QFileInfo(parser.value(OutOption)).absoluteFilePath();
+    auto store = openStore(parser);
+    return runOutput(*store, request);
+}
+
 // The PDF run: collects (unless the items were marked by hand) and writes the catalog as a PDF.
 int pdf(const QStringList &arguments)
 {
@@ -228,10 +238,7 @@ int pdf(const QStringList &arguments)
     }
     RunRequest request = requestOf(RunRequest::Output::Pdf, parser);
     request.pageSize = size == QLatin1String("letter") ? PdfPageSize::Letter : PdfPageSize::A4;
-    if (parser.isSet(OutOption))
-        request.file = QFileInfo(parser.value(OutOption)).absoluteFilePath();
-    auto store = openStore(parser);
-    return runOutput(*store, request);
+    return runToChosenFile(parser, request);
 }
 
 // The web catalog: collects (unless the items were marked by hand) and writes the site.
@@ -248,10 +255,7 @@ int web(const QStringList &arguments)
     if (const auto exit = checkSettingsFile(parser))
         return *exit;
     RunRequest request = requestOf(RunRequest::Output::Site, parser);
-    if (parser.isSet(OutOption))
-        request.file = QFileInfo(parser.value(OutOption)).absoluteFilePath();
-    auto store = openStore(parser);
-    return runOutput(*store, request);
+    return runToChosenFile(parser, request);
 }
 
 int sql(const QStringList &arguments)
