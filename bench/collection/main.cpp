@@ -6,6 +6,7 @@
 #include "FetchOnly.h"
 #include "Floor.h"
 #include "LargeDemo.h"
+#include "SqliteOdbcDriver.h"
 #include "StepClock.h"
 #include "model/CatalogSettings.h"
 #include "model/RunContext.h"
@@ -13,7 +14,6 @@
 #include "platform/FileSystem.h"
 #include "source/ConnectionString.h"
 #include "testutil/AccountingFixture.h"
-#include "testutil/SqliteOdbcDriver.h"
 #include "workdb/CollectionRun.h"
 #include "workdb/SourceStatements.h"
 #include "workdb/SqliteEngine.h"
@@ -219,7 +219,7 @@ int main(int argc, char *argv[])
         std::fprintf(stderr, "%s\n", qPrintable(source.status().description()));
         return 1;
     }
-    if (Status registered = test::registerSqliteOdbcAsSqlServer(); !registered) {
+    if (Status registered = registerSqliteOdbcAsSqlServer(); !registered) {
         std::fprintf(stderr, "%s\n", qPrintable(registered.description()));
         return 1;
     }

@@ -45,4 +45,10 @@ ConnectionParams fileConnection(const QString &path)
     return {QDir::toNativeSeparators(file.absolutePath()), {}, {}, file.fileName(), ConnectionKind::File};
 }
 
+ConnectionParams odbcConnection(const QString &path)
+{
+    return {QStringLiteral("localhost"), QStringLiteral("catalog"), QStringLiteral("secret"),
+            QFileInfo(path).absoluteFilePath(), ConnectionKind::Odbc};
+}
+
 } // namespace zorbin::test

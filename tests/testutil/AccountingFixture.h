@@ -7,7 +7,7 @@
 #include <QStringList>
 
 // Accounting databases for tests: the demo database and small SQLite files with the accounting
-// tables, reached through connection type 3 (a database file) as a user would.
+// tables, reached as a database file or through ODBC as a user would.
 namespace zorbin::test {
 
 // The demo's settings file (demo-settings.ini), built with the project (make-demo-db.sh).
@@ -20,5 +20,9 @@ Status makeAccountingFile(const QString &path, const QStringList &statements = {
 // Connection parameters of type 3 for a database file: the folder as the server, the file name
 // as the database.
 ConnectionParams fileConnection(const QString &path);
+
+// Connection parameters of type 1 for the SQLite file at `path`, through the SQLite ODBC driver
+// that the test's registry (ODBCSYSINI, set by ctest) names "SQL Server".
+ConnectionParams odbcConnection(const QString &path);
 
 } // namespace zorbin::test

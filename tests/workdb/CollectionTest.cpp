@@ -7,7 +7,6 @@
 #include "testutil/CaseTable.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/RecordingUserPort.h"
-#include "testutil/SqliteOdbcDriver.h"
 #include "testutil/TestFiles.h"
 #include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
@@ -152,8 +151,8 @@ private Q_SLOTS:
     void initTestCase()
     {
         QVERIFY(m_temp.isValid());
-        const Status registered = registerSqliteOdbcAsSqlServer();
-        QVERIFY2(registered, qPrintable(registered.description()));
+        QVERIFY2(qEnvironmentVariableIsSet("ODBCSYSINI"),
+                 "run through ctest, which registers the ODBC driver");
         qputenv("TMPDIR", QFile::encodeName(m_temp.path())); // the working database's folder
         m_smallSource = makeSource(u"small.db"_s, testData("small-source.sql").split(u";\n"_s));
         m_manyRows = makeSource(u"many.db"_s,

@@ -1,10 +1,9 @@
-#include "testutil/SqliteOdbcDriver.h"
+#include "SqliteOdbcDriver.h"
 
-#include <QFileInfo>
 #include <QSettings>
 #include <QTemporaryDir>
 
-namespace zorbin::test {
+namespace zorbin::bench {
 
 Status registerSqliteOdbcAsSqlServer()
 {
@@ -27,10 +26,4 @@ Status registerSqliteOdbcAsSqlServer()
     return registered;
 }
 
-ConnectionParams odbcConnection(const QString &path)
-{
-    return {QStringLiteral("localhost"), QStringLiteral("catalog"), QStringLiteral("secret"),
-            QFileInfo(path).absoluteFilePath(), ConnectionKind::Odbc};
-}
-
-} // namespace zorbin::test
+} // namespace zorbin::bench

@@ -1,9 +1,8 @@
 #pragma once
 
 #include "common/Status.h"
-#include "model/ConnectionParams.h"
 
-namespace zorbin::test {
+namespace zorbin::bench {
 
 // Registers the SQLite3 ODBC driver (libsqliteodbc) under the driver name "SQL Server" in a
 // private odbcinst.ini whose folder ODBCSYSINI names, so that the connection text of type 1,
@@ -13,7 +12,4 @@ namespace zorbin::test {
 // connection; later calls do nothing. A fault when the driver is not installed.
 Status registerSqliteOdbcAsSqlServer();
 
-// Connection parameters of type 1 that reach the SQLite file at `path` through that driver.
-ConnectionParams odbcConnection(const QString &path);
-
-} // namespace zorbin::test
+} // namespace zorbin::bench
