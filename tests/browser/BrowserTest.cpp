@@ -3,8 +3,8 @@
 #include "output/CatalogPages.h"
 #include "testutil/OutputContext.h"
 #include "testutil/TestFiles.h"
-#include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
+#include "workdb/SqliteEngine.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -115,6 +115,7 @@ private Q_SLOTS:
     // The demo's catalog and web catalog, written through the command line.
     void initTestCase()
     {
+        QVERIFY(setUpSqliteEngine()); // as the programs do
         QVERIFY2(QFileInfo(QStringLiteral(ZORBIN_CHROMIUM)).isExecutable(), ZORBIN_CHROMIUM);
         const auto cli = [this](const QStringList &arguments) {
             return QString::fromLocal8Bit(run(QStringLiteral(ZORBIN_CLI), arguments, m_work.path()).first)
@@ -210,9 +211,8 @@ private Q_SLOTS:
         test::WorkRows rows;
         for (const QString &name : names) {
             test::writeFile(pictures + u'/' + name, png);
-            rows.items << test::WorkItem(u"P%1"_s.arg(rows.items.size()));
-            rows.items.last().name = name;
-            rows.items.last().picture = pictures + u'/' + name;
+            rows.items << test::WorkItem{
+                .key = u"P%1"_s.arg(rows.items.size()), .name = name, .picture = pictures + u'/' + name};
         }
         const QString db = m_work.filePath(u"marks.db"_s), out = m_work.filePath(u"marks/"_s);
         QVERIFY(test::makeWorkDatabase(db, rows));
@@ -241,10 +241,6 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_TEST_CLASS(BrowserTest)
-
-ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
-ZORBIN_TEST_ADD(BrowserTest)
-ZORBIN_TEST_MAIN_END
+QTEST_GUILESS_MAIN(BrowserTest)
 
 #include "BrowserTest.moc"

@@ -14,11 +14,11 @@
 #include "testutil/CaseTable.h"
 #include "testutil/DemoScratch.h"
 #include "testutil/MemorySettingsStore.h"
+#include "testutil/Pictures.h"
 #include "testutil/RecordingStages.h"
 #include "testutil/TestFiles.h"
 
 #include <QApplication>
-#include <QBuffer>
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDropEvent>
@@ -174,23 +174,6 @@ bool drop(QWidget *target, const QString &array, int index, QMimeData *payload =
     if (enter.isAccepted())
         QApplication::sendEvent(target, &dropped);
     return enter.isAccepted() && dropped.isAccepted();
-}
-
-// A 40 x 20 JPEG picture whose Exif orientation (6) says that it is to be turned a quarter to
-// the right, as a telephone camera stores a picture taken upright.
-QByteArray uprightPhoto()
-{
-    QImage image(40, 20, QImage::Format_RGB32);
-    image.fill(Qt::red);
-    QByteArray jpeg;
-    QBuffer buffer(&jpeg);
-    buffer.open(QIODevice::WriteOnly);
-    image.save(&buffer, "JPG");
-    // An APP1 segment after the start marker: "Exif", a big-endian TIFF header, one entry.
-    return jpeg.insert(2, QByteArray("\xFF\xE1\x00\x22"
-                                     "Exif\0\0MM\0\x2A\0\0\0\x08\0\x01"
-                                     "\x01\x12\0\x03\0\0\0\x01\0\x06\0\0\0\0\0\0",
-                                     36));
 }
 
 // Each kind of widget shows its stored option at start-up, and a user's edit is what the save
@@ -402,7 +385,7 @@ private Q_SLOTS:
         chooser->click(); // Cancel
         QCOMPARE(rig.find<QLineEdit>(u"txtLogo"_qs)->text(), QString());
         rig.files.answer = folder.filePath(u"logo.jpg"_qs);
-        writeFile(*rig.files.answer, uprightPhoto());
+        writeFile(*rig.files.answer, turned({40, 20}));
         chooser->click();
         QCOMPARE(rig.settings().logo, *rig.files.answer);
         chooser->click();

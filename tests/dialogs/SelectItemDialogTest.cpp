@@ -54,11 +54,9 @@ private Q_SLOTS:
             {"AB300", "לוח", true},           {"A100", "עט", true},
             {"א-5", "שולחן", false},          {"ב-10", "כיסא", true}};
         WorkRows rows;
-        for (const auto &[key, name, marked] : items) {
-            rows.items << WorkItem(QString::fromUtf8(key));
-            rows.items.last().name = QString::fromUtf8(name);
-            rows.items.last().include = marked;
-        }
+        for (const auto &[key, name, marked] : items)
+            rows.items << WorkItem{
+                .key = QString::fromUtf8(key), .name = QString::fromUtf8(name), .include = marked};
         QVERIFY(makeWorkDatabase(m_path, rows).isOk());
     }
 
@@ -163,7 +161,7 @@ private Q_SLOTS:
         const QString path = m_folder.filePath(u"long.tmp"_qs);
         WorkRows rows;
         for (int i = 0; i < count; ++i)
-            rows.items << WorkItem(u"K%1"_qs.arg(i, 6, 10, QLatin1Char('0')));
+            rows.items << WorkItem{u"K%1"_qs.arg(i, 6, 10, QLatin1Char('0'))};
         QVERIFY(makeWorkDatabase(path, rows).isOk());
         frmSelectItem dialog(path);
         QCOMPARE(dialog.model()->rowCount(), count);

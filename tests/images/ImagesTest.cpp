@@ -1,7 +1,5 @@
-// The pictures of a catalog: the header readers on pictures that ImageMagick made at build time
-// (the target image-test-pictures) and on damaged and foreign data, the fitting into the largest
-// picture box and the size attributes of the pages, and the copying of the logo and the
-// catalog's pictures into the images folder.
+// The pictures of a catalog: the header readers on ImageMagick's pictures (made at build time) and
+// on damaged data, the fitting into the picture box, the copying into the images folder.
 #include "output/CopiedPictures.h"
 #include "output/ImageCollection.h"
 #include "output/ImageDimensions.h"
@@ -29,11 +27,6 @@ namespace {
 QString testPicture(const QString &name)
 {
     return QStringLiteral(ZORBIN_TEST_PICTURES "/") + name;
-}
-
-QByteArray testPictureBytes(const QString &name)
-{
-    return readFile(testPicture(name));
 }
 
 ImageInfo infoOf(const QByteArray &bytes)
@@ -119,10 +112,9 @@ struct Catalog
     {
         WorkRows rows;
         for (qsizetype i = 0; i < references.size(); ++i) {
-            WorkItem item(u"A%1"_qs.arg(i + 1, 2, 10, QLatin1Char('0')));
-            item.picture = references.at(i).isNull() ? QVariant() : QVariant(references.at(i));
-            item.include = !leftOut.contains(i);
-            rows.items << item;
+            rows.items << WorkItem{.key = u"A%1"_qs.arg(i + 1, 2, 10, QLatin1Char('0')),
+                                   .picture = references.at(i).isNull() ? QVariant() : references.at(i),
+                                   .include = !leftOut.contains(i)};
         }
         QVERIFY(makeWorkDatabase(database(), rows).isOk());
     }
@@ -174,7 +166,7 @@ private Q_SLOTS:
         QFETCH(QString, file);
         QFETCH(ImageInfo, expected);
         QCOMPARE(GetImageInfo(testPicture(file)), expected);
-        QCOMPARE(infoOf(testPictureBytes(file)), expected);
+        QCOMPARE(infoOf(readFile(testPicture(file))), expected);
     }
 
     void readsData_data()
@@ -183,12 +175,12 @@ private Q_SLOTS:
         QTest::addColumn<ImageInfo>("expected");
         const ImageInfo none;
         const ImageInfo jpeg{ImageInfo::JPEG, 200, 300};
-        const QByteArray bmp = testPictureBytes(u"bottom-up.bmp"_qs);
+        const QByteArray bmp = readFile(testPicture(u"bottom-up.bmp"_qs));
         // A top-down bitmap stores its height negative.
         QTest::newRow("top-down bitmap")
             << QByteArray::fromHex("424D 00000000 00000000 36000000 28000000 20030000 A8FDFFFF")
             << ImageInfo{ImageInfo::BMP, 800, 600};
-        QByteArray png = testPictureBytes(u"png-type2.png"_qs);
+        QByteArray png = readFile(testPicture(u"png-type2.png"_qs));
         png[25] = 5;
         QTest::newRow("PNG of colour type 5") << png << none;
         QTest::newRow("... with a JPEG in it") << png + jpegWithFrame(0xC0) << jpeg;
@@ -204,7 +196,7 @@ private Q_SLOTS:
         QTest::newRow("arithmetic conditioning CC") << jpegWithFrame(0xC0, {{0xCC, 4}}) << jpeg;
         QTest::newRow("a segment of 65535 bytes") << jpegWithFrame(0xC0, {{0xE2, 65535}}) << jpeg;
         // The JPEG start behind a wrapper: the search reads blocks of 4096 bytes, up to its limit.
-        const QByteArray exif = testPictureBytes(u"baseline-exif.jpg"_qs);
+        const QByteArray exif = readFile(testPicture(u"baseline-exif.jpg"_qs));
         for (const qsizetype wrapper : {qsizetype(128), qsizetype(4093), qsizetype(4094), qsizetype(4095),
                                         qsizetype(JpegSearchLimit - 1), qsizetype(JpegSearchLimit)}) {
             QTest::addRow("behind %lld bytes", static_cast<long long>(wrapper))
@@ -225,9 +217,10 @@ private Q_SLOTS:
             << ImageInfo{ImageInfo::PNG, 2147483647, 1};
         // Each kind cut just before the last header byte the reader needs, and just after it.
         const std::tuple<const char *, QByteArray, qsizetype, ImageInfo> ends[] = {
-            {"PNG", testPictureBytes(u"png-type2.png"_qs), 26, {ImageInfo::PNG, 240, 90}},
-            {"GIF", testPictureBytes(u"picture.gif"_qs), 10, {ImageInfo::GIF, 16, 17}},
+            {"PNG", readFile(testPicture(u"png-type2.png"_qs)), 26, {ImageInfo::PNG, 240, 90}},
+            {"GIF", readFile(testPicture(u"picture.gif"_qs)), 10, {ImageInfo::GIF, 16, 17}},
             {"BMP", bmp, 26, {ImageInfo::BMP, 800, 600}},
+            {"core BMP", readFile(testPicture(u"core-header.bmp"_qs)), 22, {ImageInfo::BMP, 120, 90}},
             {"JPEG", exif, exif.indexOf("\xFF\xC0") + 9, {ImageInfo::JPEG, 640, 480}},
         };
         for (const auto &[kind, bytes, end, info] : ends) {

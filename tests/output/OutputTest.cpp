@@ -1,15 +1,11 @@
-// The output writers. First the pages, stylesheet and list of each golden case (a folder of
-// golden/ with a settings.ini), byte for byte. The cases run in the temporary folder ROOT:
-// ROOT/pictures holds the pictures of golden/pictures, the working databases lie in ROOT,
-// ROOT/out is the output folder, and the picture step's copies go to ROOT/out/images in the
-// file-per-page mode. Pages hold full paths, so ROOT is written "{root}" in the settings and
-// the expected files. A case's [Test] section holds what the store does not: OnlyWithPic=1
-// ticks the option, NoItems=1 marks no item for the catalog. ZORBIN_UPDATE_GOLDEN=1 writes the
-// produced files into the case folders instead of comparing them; review the difference before
-// committing it.
-//
-// Then the writers beyond their golden files: names at their edges, progress,
-// stop, sizes past 16 bits, and failures that must fail the run yet leave whole pages.
+// The output writers. First each golden case (a folder of golden/ with a settings.ini): pages,
+// stylesheet and list byte for byte, written in the temporary folder ROOT (pictures in
+// ROOT/pictures, output in ROOT/out), which the settings and expected files write "{root}". A
+// case's [Test] section: OnlyWithPic=1 ticks the option, NoItems=1 marks no item for the catalog.
+// ZORBIN_UPDATE_GOLDEN=1 rewrites the expected files (review the difference before committing).
+// Then names at their edges, progress, stop, sizes past 16 bits, and failures that fail the run
+// yet leave whole pages.
+#include "model/OptionTable.h"
 #include "output/CatalogPages.h"
 #include "output/FileNaming.h"
 #include "output/ListPage.h"
@@ -18,7 +14,6 @@
 #include "testutil/DamagedWorkDatabase.h"
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/OutputContext.h"
-#include "testutil/StoredOptions.h"
 #include "testutil/TestFiles.h"
 #include "testutil/WorkDatabaseFixture.h"
 #include "workdb/SqliteEngine.h"
@@ -77,11 +72,8 @@ QMap<QString, QByteArray> filesOf(const QString &folder, const QString &root = {
 Status makeItems(const QString &path, int count)
 {
     test::WorkRows rows;
-    for (int i = 1; i <= count; ++i) {
-        test::WorkItem item(u"K%1"_qs.arg(i, 7, 10, QLatin1Char('0')));
-        item.name = u"פריט %1"_qs.arg(i);
-        rows.items << item;
-    }
+    for (int i = 1; i <= count; ++i)
+        rows.items << test::WorkItem{u"K%1"_qs.arg(i, 7, 10, QLatin1Char('0')), u"פריט %1"_qs.arg(i)};
     return test::makeWorkDatabase(path, rows);
 }
 
@@ -119,23 +111,22 @@ private:
     }
 
     // Applies a case's settings as a load from the store does, after giving the source-dependent
-    // lists two entries each; whether the case marks no item for the catalog.
-    bool loadSettings(const QString &caseFolder, CatalogSettings &settings)
+    // lists two entries each.
+    void loadSettings(const QSettings &ini, CatalogSettings &settings)
     {
         for (ChoiceList *list : settings.sourceLists()) {
             list->clear();
             list->addEntry(u"ראשון"_qs, 0);
             list->addEntry(u"שני"_qs, 2);
         }
-        QSettings ini(caseFolder + u"settings.ini"_qs, QSettings::IniFormat);
         for (const QString &key : ini.allKeys()) {
             const QString value = ini.value(key).toString().replace(RootMark, m_root.path());
+            const StoredOption *option = findStoredOption(key.mid(7));
             if (key == u"Test/OnlyWithPic"_qs)
                 settings.onlyWithPicture = value == u"1"_qs;
             else if (key.startsWith(u"Params/"_qs))
-                test::setStored(settings, key.mid(7), value);
+                QVERIFY2(option && option->apply(settings, value), qPrintable(key + u'=' + value));
         }
-        return ini.value(u"Test/NoItems"_qs).toBool();
     }
 
     QString out(const QString &name = {}) const { return m_root.filePath(u"out/"_qs) + name; }
@@ -193,14 +184,9 @@ private Q_SLOTS:
     {
         QTest::addColumn<QString>("caseName");
         const QDir golden(Golden);
-        int cases = 0;
-        for (const QString &name : golden.entryList(QDir::Dirs | QDir::NoDotAndDotDot, QDir::Name)) {
-            if (!QFileInfo::exists(golden.filePath(name + u"/settings.ini"_qs)))
-                continue;
-            QTest::newRow(qPrintable(name)) << name;
-            ++cases;
-        }
-        QVERIFY(cases > 0);
+        for (const QString &name : golden.entryList(QDir::Dirs | QDir::NoDotAndDotDot, QDir::Name))
+            if (golden.exists(name + u"/settings.ini"_qs))
+                QTest::newRow(qPrintable(name)) << name;
     }
 
     void catalogFiles()
@@ -210,7 +196,9 @@ private Q_SLOTS:
         QVERIFY(QDir(out()).removeRecursively());
         QVERIFY(QDir().mkpath(out(u"images"_qs)));
         test::OutputContext output;
-        const bool noItems = loadSettings(caseFolder, output.settings);
+        const QSettings ini(caseFolder + u"settings.ini"_qs, QSettings::IniFormat);
+        loadSettings(ini, output.settings);
+        const bool noItems = ini.value(u"Test/NoItems"_qs).toBool();
         if (output.settings.pageSplit == PageSplit::FilePerPage)
             copyPictures(out(u"images"_qs));
 
@@ -374,15 +362,12 @@ private Q_SLOTS:
         QCOMPARE(output.user.widths, (QList<int>{0, 143, 286, 429, 0}));
     }
 
-    void pageNamesPastSixteenBits()
+    // Page numbers past 16 bits; the name in the images folder: what follows the platform's
+    // separator, and only that.
+    void fileNames()
     {
         QCOMPARE(HTMLFileName(u"/out/zo"_qs, 32768), u"/out/zo032768.htm"_qs);
         QCOMPARE(HTMLFileName(u"/out/zo"_qs, 1234567), u"/out/zo1234567.htm"_qs);
-    }
-
-    // The name in the images folder: what follows the platform's separator, and only that.
-    void pictureNames()
-    {
         const QString s = pathSeparator();
         const QString other = s == QLatin1String("/") ? u"\\"_qs : u"/"_qs;
         const QString images = u"images"_qs + s;

@@ -3,8 +3,8 @@
 #include "pdf/CatalogPdf.h"
 #include "testutil/OutputContext.h"
 #include "testutil/TestFiles.h"
-#include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
+#include "workdb/SqliteEngine.h"
 
 #include <QDir>
 #include <QGuiApplication>
@@ -144,11 +144,10 @@ bool near(QRgb a, QRgb b)
 WorkRows itemsWithPictures(const QStringList &pictures)
 {
     WorkRows rows;
-    for (const QString &file : pictures) {
-        rows.items << WorkItem(u"P%1"_s.arg(int(rows.items.size()), 3, 10, QChar(u'0')));
-        rows.items.last().picture =
-            file == u'?' ? file : QDir(QStringLiteral(ZORBIN_PDF_TEST_PICTURES)).filePath(file);
-    }
+    for (const QString &file : pictures)
+        rows.items << WorkItem{
+            .key = u"P%1"_s.arg(int(rows.items.size()), 3, 10, QChar(u'0')),
+            .picture = file == u'?' ? file : QDir(QStringLiteral(ZORBIN_PDF_TEST_PICTURES)).filePath(file)};
     return rows;
 }
 
@@ -196,6 +195,7 @@ private Q_SLOTS:
     // The layout catalog: eight items in Hebrew and Latin, a picture and four lines each.
     void initTestCase()
     {
+        QVERIFY(setUpSqliteEngine());                              // as the programs do
         if (qEnvironmentVariableIsSet("ZORBIN_KEEP_TEST_FILES")) { // for a look at the PDFs
             m_folder.setAutoRemove(false);
             qInfo("keeping %s", qPrintable(m_folder.path()));
@@ -386,10 +386,6 @@ private Q_SLOTS:
     }
 };
 
-// The writer draws text and pictures: a GUI application, on the offscreen platform.
-ZORBIN_TEST_CLASS(PdfTest)
-ZORBIN_TEST_MAIN_BEGIN(QGuiApplication)
-ZORBIN_TEST_ADD(PdfTest)
-ZORBIN_TEST_MAIN_END
+QTEST_MAIN(PdfTest)
 
 #include "PdfTest.moc"

@@ -368,9 +368,10 @@ private:
     QMap<QString, QString> m_server; // the PostgreSQL fixture's port, logins and passwords
 };
 
-std::unique_ptr<QObject> makeSourceConnectionTest(const QByteArray &group)
+int runSourceConnectionTest(const QByteArray &group, int argc, char *argv[])
 {
-    return std::make_unique<SourceConnectionTest>(group);
+    SourceConnectionTest test(group);
+    return QTest::qExec(&test, argc, argv) != 0 ? 1 : 0;
 }
 
 #include "SourceConnectionTest.moc"

@@ -10,7 +10,7 @@
 
 ZORBIN_DECLARE_TEST(ConnectionSettingsTest)
 ZORBIN_DECLARE_TEST(CriteriaTest)
-std::unique_ptr<QObject> makeSourceConnectionTest(const QByteArray &group);
+int runSourceConnectionTest(const QByteArray &group, int argc, char *argv[]);
 
 int main(int argc, char *argv[])
 {
@@ -22,11 +22,7 @@ int main(int argc, char *argv[])
     }
     if (group != "main" && group != "sqlite-odbc" && group != "postgres")
         qFatal("unknown test group %s", group.constData());
-    std::vector<std::unique_ptr<QObject>> tests;
-    if (group == "main") {
-        tests.push_back(makeConnectionSettingsTest());
-        tests.push_back(makeCriteriaTest());
-    }
-    tests.push_back(makeSourceConnectionTest(group));
-    return zorbin::test::runTestObjects(argc, argv, tests);
+    const int failed =
+        group == "main" ? runConnectionSettingsTest(argc, argv) + runCriteriaTest(argc, argv) : 0;
+    return failed + runSourceConnectionTest(group, argc, argv);
 }

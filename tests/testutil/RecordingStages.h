@@ -53,15 +53,14 @@ public:
     Result<PdfWritten> CreateCatPDF(RunContext &context, const PdfRequest &request) override
     {
         record(context, QStringLiteral("CreateCatPDF(%1,%2)").arg(request.file, request.dbFile));
-        return PdfWritten{PdfWritten::Ending::Written, QStringLiteral("/out/zorbin.pdf"), 1, 0, 0};
+        return PdfWritten{PdfWritten::Ending::Written, request.file, 1, 0, 0};
     }
     Result<QString> CreateCatSite(RunContext &context, const SiteRequest &request) override
     {
-        record(context,
-               QStringLiteral("CreateCatSite(%1,%2,%3)")
-                   .arg(request.folder, request.dbFile,
-                        request.sections ? QStringLiteral("sections") : QStringLiteral("no sections")));
-        return QStringLiteral("/out/site/index.html");
+        record(context, QStringLiteral("CreateCatSite(%1,%2,%3)")
+                            .arg(request.folder, request.dbFile)
+                            .arg(request.sections));
+        return request.folder + QStringLiteral("/index.html");
     }
 
     // The calls without their arguments, e.g. "CreateCSS".

@@ -12,15 +12,12 @@ namespace zorbin::test {
 // picture, Null for a missing sort group, filter or price, and marked for the catalog.
 struct WorkItem
 {
-    WorkItem() = default;
-    explicit WorkItem(QString itemKey) : key(std::move(itemKey)) {}
-
     QString key;
     QVariant name = QStringLiteral("?");
-    QVariant sort;
-    QVariant filter;
+    QVariant sort{};
+    QVariant filter{};
     QVariant unit = QStringLiteral("?");
-    QVariant price;
+    QVariant price{};
     QVariant coin = QStringLiteral("?");
     QVariant picture = QStringLiteral("?");
     bool include = true;

@@ -2,54 +2,29 @@
 // a small working database: what the pages hold and refer to, what a stop, a failure, no items leave.
 #include "testutil/FaultyFileSystem.h"
 #include "testutil/OutputContext.h"
+#include "testutil/Pictures.h"
 #include "testutil/TestFiles.h"
-#include "testutil/TestMain.h"
 #include "testutil/WorkDatabaseFixture.h"
 #include "web/CatalogSite.h"
 #include "web/ItemSpool.h"
 #include "web/SiteNames.h"
 #include "web/ThumbnailImages.h"
 #include "web/ThumbnailStore.h"
+#include "workdb/SqliteEngine.h"
 
-#include <QBuffer>
 #include <QCoreApplication>
 #include <QDirIterator>
-#include <QPainter>
 #include <QRegularExpression>
 #include <QTemporaryDir>
 #include <QTest>
 
 using namespace zorbin;
+using namespace zorbin::test;
 using namespace Qt::Literals::StringLiterals;
 
 namespace {
 
 const QSize Box(120, 90);
-
-QByteArray encoded(const QImage &image, const char *format)
-{
-    QBuffer buffer;
-    buffer.open(QIODevice::WriteOnly);
-    image.save(&buffer, format);
-    return buffer.data();
-}
-
-// Left half red, right half blue, so that a turn shows where the halves went.
-QByteArray halves(QSize size, const char *format = "JPEG")
-{
-    QImage image(size, QImage::Format_RGB32);
-    image.fill(Qt::blue);
-    QPainter(&image).fillRect(0, 0, size.width() / 2, size.height(), Qt::red);
-    return encoded(image, format);
-}
-
-// A JPEG whose EXIF orientation (6) says that it is shown turned a quarter clockwise.
-QByteArray turned(QSize size)
-{
-    const QByteArray exif("Exif\0\0II*\0\x08\0\0\0\x01\0\x12\x01\x03\0\x01\0\0\0\x06\0\0\0\0\0\0\0", 32);
-    const QByteArray jpeg = halves(size);
-    return jpeg.left(2) + QByteArray("\xFF\xE1\0", 3) + char(exif.size() + 2) + exif + jpeg.mid(2);
-}
 
 // Two items a page: the picture, the name, the key and the price, in the order of the keys.
 struct SiteRun : test::OutputContext
@@ -98,16 +73,12 @@ private Q_SLOTS:
     // exist, are missing, or are not named.
     void initTestCase()
     {
+        QVERIFY(setUpSqliteEngine()); // as the programs do
         const QString photo = m_dir.filePath(u"photo.jpg"_s);
         test::writeFile(photo, halves({640, 480}));
         test::WorkRows rows;
         const auto item = [&](const char *key, const QString &name, QVariant sort, QVariant picture) {
-            rows.items << test::WorkItem{QLatin1String(key)};
-            rows.items.last().name = name;
-            rows.items.last().sort = sort;
-            rows.items.last().picture = picture;
-            rows.items.last().price = 1234.5;
-            rows.items.last().coin = u"ש\"ח"_s;
+            rows.items << test::WorkItem{QLatin1String(key), name, sort, {}, {}, 1234.5, u"ש\"ח"_s, picture};
         };
         item("K1", u"כיסא <b>&\"'"_s, 2, photo);
         item("K2", u"Lamp 😀 灯"_s, 1, m_dir.filePath(u"missing.jpg"_s));
@@ -327,10 +298,6 @@ private Q_SLOTS:
     }
 };
 
-ZORBIN_TEST_CLASS(WebTest)
-
-ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
-ZORBIN_TEST_ADD(WebTest)
-ZORBIN_TEST_MAIN_END
+QTEST_GUILESS_MAIN(WebTest)
 
 #include "WebTest.moc"

@@ -1,11 +1,14 @@
 #include "testutil/TestMain.h"
+#include "workdb/SqliteEngine.h"
 
 #include <QCoreApplication>
 
 ZORBIN_DECLARE_TEST(WorkDatabaseTest)
 ZORBIN_DECLARE_TEST(CollectionTest)
 
-ZORBIN_TEST_MAIN_BEGIN(QCoreApplication)
-ZORBIN_TEST_ADD(WorkDatabaseTest)
-ZORBIN_TEST_ADD(CollectionTest)
-ZORBIN_TEST_MAIN_END
+int main(int argc, char *argv[])
+{
+    zorbin::setUpSqliteEngine(); // as the programs do
+    QCoreApplication app(argc, argv);
+    return runWorkDatabaseTest(argc, argv) + runCollectionTest(argc, argv);
+}
