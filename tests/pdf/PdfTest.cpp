@@ -335,6 +335,32 @@ private Q_SLOTS:
         QVERIFY(near(flat.pixel(280, 100), qRgb(0, 192, 0)));
     }
 
+    // The picture beside the lines takes a column at the cell's right, and the lines end left of
+    // it; without a picture among the lines, they reach the cell's edge.
+    void pictureBesideTheLines_data()
+    {
+        QTest::addColumn<int>("firstField"); // the name comes second
+        QTest::newRow("the picture") << 0;
+        QTest::newRow("the key") << 1;
+    }
+    void pictureBesideTheLines()
+    {
+        QFETCH(int, firstField);
+        OutputContext out;
+        out.settings.pictureLocation = PictureLocation::BesideLines;
+        out.settings.lines[0].field = firstField;
+        out.settings.lines[1].field = 2;
+        const QString pdf = m_folder.filePath(u"beside.pdf"_s);
+        QVERIFY(write(out, pdf, itemsWithPictures(Pictures), Rows, Columns));
+        const QList<Line> lines = cellLines(pdfWords(pdf).constFirst());
+        QCOMPARE(lines.size(), Rows * Columns * (firstField == 0 ? 1 : 2));
+        for (const Line &line : lines) {
+            const double gap = cellRight(line.constLast()) - line.constLast().xMax;
+            QVERIFY2(firstField == 0 ? gap > CellWidth / 4 : gap <= Millimetre,
+                     qPrintable(line.constLast().text));
+        }
+    }
+
     // Many distinct pictures, each shown twice, half the catalog apart, so that all are kept at
     // once: every one decoded and stored once, drawn from where it was kept (a cache that moved
     // its pictures as it grew drew freed memory).
