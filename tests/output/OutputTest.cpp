@@ -121,11 +121,12 @@ private:
         }
         for (const QString &key : ini.allKeys()) {
             const QString value = ini.value(key).toString().replace(RootMark, m_root.path());
-            const StoredOption *option = findStoredOption(key.mid(7));
-            if (key == u"Test/OnlyWithPic"_qs)
+            if (key == u"Test/OnlyWithPic"_qs) {
                 settings.onlyWithPicture = value == u"1"_qs;
-            else if (key.startsWith(u"Params/"_qs))
+            } else if (key.startsWith(u"Params/"_qs)) {
+                const StoredOption *option = findStoredOption(key.mid(7));
                 QVERIFY2(option && option->apply(settings, value), qPrintable(key + u'=' + value));
+            }
         }
     }
 

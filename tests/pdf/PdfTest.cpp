@@ -195,8 +195,9 @@ private Q_SLOTS:
     // The layout catalog: eight items in Hebrew and Latin, a picture and four lines each.
     void initTestCase()
     {
-        QVERIFY(setUpSqliteEngine());                              // as the programs do
-        if (qEnvironmentVariableIsSet("ZORBIN_KEEP_TEST_FILES")) { // for a look at the PDFs
+        QVERIFY(setUpSqliteEngine()); // as the programs do
+        if (qEnvironmentVariableIsSet("ZORBIN_KEEP_TEST_FILES")) {
+            // For a look at the PDFs.
             m_folder.setAutoRemove(false);
             qInfo("keeping %s", qPrintable(m_folder.path()));
         }
