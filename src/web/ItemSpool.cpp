@@ -73,11 +73,7 @@ Result<QByteArrayView> ItemSpool::next(std::size_t stream)
     if (stream >= m_streams.size())
         return ended();
     Stream &from = m_streams[stream];
-    if (!from.reading) {
-        from.reading = true;
-        from.block = 0;
-        from.at = 0;
-    } else if (from.block < from.blocks.size() && from.at >= from.blocks[from.block].size) {
+    if (from.block < from.blocks.size() && from.at >= from.blocks[from.block].size) {
         ++from.block;
         from.at = 0;
     }

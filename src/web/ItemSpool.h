@@ -42,7 +42,6 @@ private:
     {
         QByteArray waiting;        // records not yet in the file
         std::vector<Block> blocks; // in the file, in order
-        bool reading = false;      // whether `block` and `at` tell where reading stands
         std::size_t block = 0;     // the block being read
         qsizetype at = 0;          // where its next record starts
     };
