@@ -452,7 +452,7 @@ private Q_SLOTS:
         CellLines &lines = rig.settings().lines;
         lines[0].field = 6;
         lines[0].format = CellFormat{1, 9, 2, 1, 1, 2};
-        lines[1].format = CellFormat{7, 11, 0, 0, 0, 1};
+        lines[1].format = CellFormat{3, 11, 0, 0, 0, 1}; // no font 3
         rig.card->tabs()->setCurrentIndex(MainCard::PageSetupPage);
         QTest::mouseClick(rig.find(Slot.arg(0)), Qt::LeftButton);
         auto *font = rig.find<QComboBox>(u"CmbFontAll"_qs);
@@ -492,7 +492,7 @@ private Q_SLOTS:
         rig.card->tabs()->setCurrentIndex(MainCard::PageSetupPage);
         QVERIFY(!apply->isEnabled());
         rig.card->pageSetupTab()->editor()->cmdSetLabDef_Click();
-        QCOMPARE(lines[1].format, (CellFormat{7, 11, 0, 0, 0, 1}));
+        QCOMPARE(lines[1].format, (CellFormat{3, 11, 0, 0, 0, 1}));
     }
 };
 

@@ -181,6 +181,7 @@ private Q_SLOTS:
             << QByteArray::fromHex("424D 00000000 00000000 36000000 28000000 20030000 A8FDFFFF")
             << ImageInfo{ImageInfo::BMP, 800, 600};
         QByteArray png = readFile(testPicture(u"png-type2.png"_qs));
+        QTest::newRow("PNG signature without its first byte") << QByteArray("x") + png.mid(1) << none;
         png[25] = 5;
         QTest::newRow("PNG of colour type 5") << png << none;
         QTest::newRow("... with a JPEG in it") << png + jpegWithFrame(0xC0) << jpeg;

@@ -155,6 +155,11 @@ private Q_SLOTS:
         QCOMPARE(first[2], (Thumbnail{u"pictures/placeholder.svg"_s, QString(), Box}));
         QCOMPARE(run(), first);
         QCOMPARE(decoded, 0);
+        // A run that stopped after the first picture keeps the others in the record.
+        auto stopped = ThumbnailStore::open(site);
+        QVERIFY(stopped.value()->thumbnailOf(pictures[0], Box) && stopped.value()->saveRecord(true));
+        QCOMPARE(run(), first);
+        QCOMPARE(decoded, 0);
 
         test::writeFile(pictures[0], halves({600, 800}));
         QFile(pictures[0])
