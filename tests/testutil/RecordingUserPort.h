@@ -16,7 +16,6 @@ public:
     struct Message
     {
         QString text;
-        QString title;
         MessageIcon icon;
     };
 
@@ -26,9 +25,9 @@ public:
         questionButtons << buttons;
         return answers.isEmpty() ? Answer::Yes : answers.takeFirst();
     }
-    void tell(const QString &text, const QString &title, MessageIcon icon) override
+    void tell(const QString &text, const QString &, MessageIcon icon) override
     {
-        messages << Message{text, title, icon};
+        messages << Message{text, icon};
     }
     void showStatus(const QString &text) override { statuses << text; }
     int progressFrameWidth() const override { return frameWidth; }

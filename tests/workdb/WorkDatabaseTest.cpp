@@ -200,12 +200,22 @@ private Q_SLOTS:
                  qPrintable(created.description()));
     }
 
-    void rowsOfAnOpenTransactionAreKeptWhenTheConnectionCloses()
+    // The rows of an open transaction are kept: a commit refused while another connection reads
+    // leaves the transaction open for a later commit, and closing the connection commits.
+    void rowsOfAnOpenTransactionAreKept()
     {
-        QVERIFY(m_work->begin());
-        QVERIFY(insert(u"tItems"_s, u"kept"_s));
+        QVERIFY(m_work->begin() && insert(u"tItems"_s, u"later"_s));
+        sqlite3 *other = nullptr;
+        sqlite3_stmt *reading = nullptr;
+        sqlite3_open_v2(QFile::encodeName(m_path).constData(), &other, SQLITE_OPEN_READONLY, nullptr);
+        sqlite3_prepare_v2(other, "SELECT name FROM sqlite_master", -1, &reading, nullptr);
+        QCOMPARE(sqlite3_step(reading), SQLITE_ROW);
+        QVERIFY(!m_work->commit());
+        sqlite3_finalize(reading);
+        sqlite3_close(other);
+        QVERIFY(m_work->commit() && m_work->begin() && insert(u"tItems"_s, u"kept"_s));
         m_work.reset();
-        QCOMPARE(readWorkTable(m_path, u"tItems"_s).size(), 1);
+        QCOMPARE(readWorkTable(m_path, u"tItems"_s).size(), 2);
     }
 
     // True and False in the statements on the working database become -1 and 0. Each statement
