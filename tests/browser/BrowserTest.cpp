@@ -6,7 +6,6 @@
 #include "testutil/WorkDatabaseFixture.h"
 #include "workdb/SqliteEngine.h"
 
-#include <QCoreApplication>
 #include <QDir>
 #include <QJsonArray>
 #include <QJsonDocument>

@@ -7,7 +7,6 @@
 #include "workdb/SqliteEngine.h"
 
 #include <QDir>
-#include <QGuiApplication>
 #include <QImage>
 #include <QProcess>
 #include <QRegularExpression>

@@ -6,8 +6,6 @@
 #include "testutil/CaseTable.h"
 #include "testutil/TestMain.h"
 
-#include <QTemporaryDir>
-
 using namespace zorbin;
 using namespace zorbin::test;
 using namespace Qt::Literals::StringLiterals;

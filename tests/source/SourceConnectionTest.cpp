@@ -10,7 +10,6 @@
 #include "testutil/TestFiles.h"
 
 #include <QDir>
-#include <QFileInfo>
 #include <QSettings>
 #include <QSqlRecord>
 #include <QTemporaryDir>

@@ -12,7 +12,6 @@
 #include "web/ThumbnailStore.h"
 #include "workdb/SqliteEngine.h"
 
-#include <QCoreApplication>
 #include <QDirIterator>
 #include <QRegularExpression>
 #include <QTemporaryDir>
@@ -224,8 +223,9 @@ private Q_SLOTS:
         QCOMPARE(pages.join(u" | "_s), keys);
         const QByteArray all = files.values().join();
         QCOMPARE(all.contains("<section"), sections);
-        QCOMPARE(files.value(u"index.html"_s).contains("<li><a href=\"page-2.html#s-2\">קבוצת מיון 2</a>"),
-                 sections);
+        const QByteArray sectionLink = "<li><a href=\"page-2.html#s-2\">קבוצת מיון 2</a>"; // first page only
+        QCOMPARE(QList({files.value(u"index.html"_s).count(sectionLink), all.count(sectionLink)}),
+                 QList<qsizetype>(2, sections));
         QCOMPARE(files.value(u"page-3.html"_s).contains("id=\"s-none\""), sections);
         QVERIFY(files.value(u"page-3.html"_s).contains("<a href=\"page-2.html\" rel=\"prev\">"));
         QVERIFY(all.contains("<bdi>כיסא &lt;b&gt;&amp;&quot;&#39;</bdi>") && !all.contains("<b>&"));
